@@ -1,0 +1,31 @@
+# Helpers shared by the subsystem directories.
+
+# vspr_subsystem(NAME [LIBS ...]): a static, position-independent library
+# vspr_NAME from every .cpp in the calling directory. It joins the provider
+# module (whole archive, so that static registrations are kept).
+function(vspr_subsystem name)
+  cmake_parse_arguments(ARG "" "" "LIBS" ${ARGN})
+  file(GLOB srcs CONFIGURE_DEPENDS "${CMAKE_CURRENT_SOURCE_DIR}/*.cpp")
+  add_library(vspr_${name} STATIC ${srcs})
+  target_include_directories(vspr_${name} PUBLIC "${CMAKE_CURRENT_SOURCE_DIR}")
+  target_compile_options(vspr_${name} PRIVATE -fvisibility=hidden -fvisibility-inlines-hidden)
+  if(ARG_LIBS)
+    target_link_libraries(vspr_${name} PUBLIC ${ARG_LIBS})
+  endif()
+  set_property(GLOBAL APPEND PROPERTY VSPR_MODULE_LIBS vspr_${name})
+endfunction()
+
+# vspr_tests(LIBS ...): one GoogleTest executable per test_*.cpp in the
+# calling directory, so that one broken test file never hides the others.
+function(vspr_tests)
+  cmake_parse_arguments(ARG "" "PREFIX" "LIBS;PROPERTIES" ${ARGN})
+  file(GLOB tests CONFIGURE_DEPENDS "${CMAKE_CURRENT_SOURCE_DIR}/test_*.cpp")
+  foreach(src ${tests})
+    get_filename_component(base ${src} NAME_WE)
+    set(exe ${ARG_PREFIX}${base})
+    add_executable(${exe} ${src})
+    target_link_libraries(${exe} PRIVATE ${ARG_LIBS} GTest::gtest GTest::gtest_main Threads::Threads)
+    gtest_discover_tests(${exe} DISCOVERY_TIMEOUT 60
+      PROPERTIES ENVIRONMENT "VSPR_BUILD_DIR=${CMAKE_BINARY_DIR};VSPR_SOURCE_DIR=${CMAKE_SOURCE_DIR}" ${ARG_PROPERTIES})
+  endforeach()
+endfunction()
