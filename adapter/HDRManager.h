@@ -1,0 +1,36 @@
+#ifndef _VSPR_HDRManager_h
+#define _VSPR_HDRManager_h
+
+#include "Array.h"
+#include "Instance.h"
+#include "ProviderTypes.h"
+
+namespace OLMA
+{
+
+// The facade for host discovered resources: the storage extents, tape
+// drives and logical disks behind the FC ports. The caller owns the
+// instances of the returned array.
+class HDRManager
+{
+public:
+
+    HDRManager();
+
+    static HDRManager* getHDRManager();
+
+    Array<Instance*> getInstances(classId_t id);
+
+    static HDRManager* helperObj;
+
+private:
+
+    HDRManager(const HDRManager&);
+    HDRManager& operator=(const HDRManager&);
+};
+
+extern HDRManager gHDRManagerObj;
+
+} // namespace OLMA
+
+#endif
