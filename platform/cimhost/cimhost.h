@@ -1,0 +1,264 @@
+#ifndef _OLMA_cimhost_h
+#define _OLMA_cimhost_h
+
+// cimhost: a small CIM server for one provider module.
+//
+// It loads a CMPI provider module with dlopen, learns from an SFCB-style .reg
+// file which provider serves which class, and serves the operations a WBEM
+// client would send (enumerate, get, associations, methods, indications)
+// through the providers' MI tables, with a complete broker behind them.
+// Tests drive a module through a Host; the `cimhost` command is a thin
+// wrapper around the same calls.
+//
+// Typical use:
+//
+//     OLMA::cimhost::Options opts;            // defaults: the built module
+//     OLMA::cimhost::Host host(opts);
+//     if (!host.ok()) { puts(host.error().c_str()); ... }
+//     OLMA::cimhost::Object_Path cls;
+//     std::string err;
+//     OLMA::cimhost::parse_path("root/vespera:VESPERA_FCPort", cls, err);
+//     OLMA::cimhost::Result r = host.ei(cls);
+//     for (auto& inst : r.instances)
+//         printf("%s\n", inst.get_text("DeviceID").c_str());
+//
+// Every CMPI object that the host hands to a provider during an operation is
+// freed when the operation ends, unless the provider released it first; the
+// results are plain C++ copies and own nothing of CMPI.
+//
+// A Host is not meant to be shared between threads that call it at the same
+// time; providers' own threads may call the broker at any time.
+
+#include <cstdint>
+#include <memory>
+#include <string>
+#include <vector>
+
+#include "cmpidt.h"
+
+namespace OLMA
+{
+namespace cimhost
+{
+
+struct Instance;
+struct Object_Path;
+
+// One CIM value. `type` is the CMPI type code; arrays have the CMPI_ARRAY bit
+// and their elements in `elements`. Numbers, boolean and char16 live in `num`
+// (read the member of the type), strings and datetimes (CIM text form) in
+// `str`, references in `ref`, embedded instances in `inst`.
+struct Value
+{
+    CMPIType type = CMPI_null;
+    bool null = true;
+    CMPIValue num {};
+    std::string str;
+    std::shared_ptr<Object_Path> ref;
+    std::shared_ptr<Instance> inst;
+    std::vector<Value> elements;
+
+    bool is_array() const { return (type & CMPI_ARRAY) != 0; }
+
+    // The value as text: numbers in decimal, booleans "true"/"false",
+    // strings and datetimes as they are, references in the path text form,
+    // embedded instances as "instance of <Class>", arrays as
+    // "{e1, e2}" with strings quoted; "NULL" for a null value.
+    std::string text() const;
+
+    static Value of_string(const std::string& s);
+    static Value of_uint(CMPIType type, uint64_t v);
+    static Value of_sint(CMPIType type, int64_t v);
+    static Value of_bool(bool b);
+    static Value of_real(CMPIType type, double v);
+    static Value of_datetime(const std::string& cim_text);
+    static Value of_ref(const Object_Path& path);
+    static Value of_instance(const Instance& inst);
+    static Value null_of(CMPIType type);
+};
+
+// Equal type, null state and content (recursively).
+bool operator==(const Value& a, const Value& b);
+inline bool operator!=(const Value& a, const Value& b) { return !(a == b); }
+
+struct Property
+{
+    std::string name;
+    Value value;
+};
+
+struct Object_Path
+{
+    std::string host;
+    std::string name_space;
+    std::string class_name;
+    std::vector<Property> keys;
+
+    // "root/vespera:VESPERA_FCPort.CreationClassName=\"VESPERA_FCPort\",DeviceID=\"x\"";
+    // keys in their stored order.
+    std::string to_string() const;
+    // By name, without regard to case; null if absent.
+    const Value* key(const std::string& name) const;
+};
+
+// Same class and namespace (without regard to case), same keys in any
+// order, values compared with regard to case.
+bool path_equal(const Object_Path& a, const Object_Path& b);
+
+struct Instance
+{
+    std::string class_name;
+    Object_Path path;
+    // In the order the provider set them.
+    std::vector<Property> properties;
+
+    // By name, without regard to case; null if absent.
+    const Value* get(const std::string& name) const;
+    // Value::text() of the property, "" if absent.
+    std::string get_text(const std::string& name) const;
+};
+
+// The outcome of one operation.
+struct Result
+{
+    CMPIrc rc = CMPI_RC_OK;
+    std::string message;   // the provider's status text, or the host's reason
+    std::vector<Instance> instances;
+    std::vector<Object_Path> paths;
+    Value return_value;    // cm only
+    std::vector<Property> out;   // cm only: out parameters
+
+    bool ok() const { return rc == CMPI_RC_OK; }
+};
+
+// "CMPI_RC_ERR_NOT_FOUND" and so on; "CMPI_RC_<n>" for an unknown code.
+std::string rc_name(int rc);
+
+struct Indication_Record
+{
+    std::string name_space;
+    Instance instance;
+};
+
+struct Options
+{
+    // Defaults: the module and .reg file of the build that made this library.
+    std::string module_path;
+    std::string reg_path;
+    // Serve "root/PG_InterOp" CIM_ObjectManager from the built-in stand-in.
+    // When off, enumerations of that namespace fail with
+    // CMPI_RC_ERR_INVALID_NAMESPACE.
+    bool interop = true;
+    // When on together with interop, the stand-in answers with no instance.
+    bool interop_empty = false;
+    // The "CMPIPrincipal" entry of every context.
+    std::string principal = "cimhost";
+};
+
+// Path text parsing. Accepts "[//host/]ns:Class[.key=value,...]" and
+// "Class[.key=...]" (namespace then comes from `default_ns`). Values are
+// "quoted strings" (backslash escapes \" and \\), TRUE/FALSE, integers,
+// reals, or quoted paths for references. Without class knowledge a quoted
+// text that reads as a path with keys becomes a reference. False with a
+// one-line reason in `err`.
+bool parse_path(const std::string& text, Object_Path& path, std::string& err,
+                const std::string& default_ns = "");
+
+// A typed value from "TYPE:VALUE": TYPE one of boolean, uint8..sint64,
+// real32, real64, char16, string, datetime, ref (VALUE a path), with "[]"
+// after TYPE for an array whose elements are separated by commas (a
+// backslash escapes a comma). "null:" gives a null value of no type.
+bool parse_typed_value(const std::string& text, Value& v, std::string& err);
+
+// Text of VALUE read as the given CMPI type (array or not).
+bool parse_value_as(CMPIType type, const std::string& text, Value& v, std::string& err);
+
+class Host_Impl;
+
+class Host
+{
+public:
+    explicit Host(const Options& options = Options());
+    ~Host();
+    Host(const Host&) = delete;
+    Host& operator=(const Host&) = delete;
+
+    // False if the module or the .reg file couldn't be loaded; error() says why.
+    bool ok() const;
+    const std::string& error() const;
+
+    // Switch the "root/PG_InterOp" stand-in on or off between operations.
+    void set_interop(bool on, bool empty = false);
+
+    // Operations. `props` null means all properties. For ei/ein the path
+    // gives namespace and class; a class without its own provider is served
+    // by the providers of its registered subclasses.
+    Result ei(const Object_Path& cls, const std::vector<std::string>* props = nullptr);
+    Result ein(const Object_Path& cls);
+    Result gi(const Object_Path& path, const std::vector<std::string>* props = nullptr);
+    // Empty filter texts mean no filter. With no assoc_class every
+    // association provider of the namespace whose class can refer to the
+    // source is asked.
+    Result ai(const Object_Path& path, const std::string& assoc_class = "",
+              const std::string& result_class = "", const std::string& role = "",
+              const std::string& result_role = "",
+              const std::vector<std::string>* props = nullptr);
+    Result an(const Object_Path& path, const std::string& assoc_class = "",
+              const std::string& result_class = "", const std::string& role = "",
+              const std::string& result_role = "");
+    // result_class names the association class, as in CIM.
+    Result ri(const Object_Path& path, const std::string& result_class = "",
+              const std::string& role = "", const std::vector<std::string>* props = nullptr);
+    Result rn(const Object_Path& path, const std::string& result_class = "",
+              const std::string& role = "");
+    Result cm(const Object_Path& path, const std::string& method,
+              const std::vector<Property>& in);
+
+    // Indications. subscribe() runs authorizeFilter, mustPoll, activateFilter
+    // (and enableIndications for a provider's first filter) on every
+    // indication provider of the class; `id` receives a handle for
+    // unsubscribe(), which runs deActivateFilter and, for the last filter,
+    // disableIndications.
+    Result subscribe(const std::string& name_space, const std::string& class_name, int& id,
+                     const std::string& query = "");
+    Result unsubscribe(int id);
+    size_t active_filters() const;
+
+    // Indications delivered so far (all namespaces), oldest first.
+    std::vector<Indication_Record> indications() const;
+    void clear_indications();
+    // Waits until at least `count` indications were delivered in all, or the
+    // timeout passes; returns how many there are.
+    size_t wait_indications(size_t count, int timeout_ms) const;
+
+    // Calls cleanup on every MI the host holds. Those that agree to unload are
+    // forgotten, so a later request makes them anew through Create_*MI.
+    // Returns how many refused (CMPI_RC_DO_NOT_UNLOAD / NEVER_UNLOAD).
+    int cleanup(bool terminating);
+
+    // Class knowledge, from the module's tables when it has them.
+    // The CIM type of a property or method parameter (CMPI code with the
+    // array bit), 0 if unknown.
+    CMPIType property_type(const std::string& class_name, const std::string& property) const;
+    CMPIType parameter_type(const std::string& class_name, const std::string& method,
+                            const std::string& parameter) const;
+    bool knows_class(const std::string& class_name) const;
+    bool class_is_a(const std::string& class_name, const std::string& ancestor) const;
+    // Types the keys of a parsed path by the class tables (references,
+    // narrower integers), so that it matches what a provider expects.
+    void type_keys(Object_Path& path) const;
+
+    // Raw access for tests that talk CMPI themselves.
+    const CMPIBroker* broker() const;
+    // Number of CMPI objects alive now (released ones excluded); 0 between
+    // operations if nothing leaked into the global scope.
+    size_t live_objects() const;
+
+private:
+    Host_Impl* impl;
+};
+
+} // namespace cimhost
+} // namespace OLMA
+
+#endif // _OLMA_cimhost_h
