@@ -47,11 +47,15 @@ public:
 
     void append(const void* data, size_t size)
     {
-        if (_size + size > _cap)
-            reserve(_size + size);
-        if (size)
+        // Growing goes through insert, which copes with data that lies in
+        // this very buffer.
+        if (size > _cap - _size)
+            insert(_size, data, size);
+        else if (size)
+        {
             memcpy(_data + _size, data, size);
-        _size += size;
+            _size += size;
+        }
     }
 
     void append(const char* str) { append(str, strlen(str)); }
