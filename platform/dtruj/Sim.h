@@ -1,0 +1,126 @@
+// Internal state of the simulated adapter library. Nothing here is exported.
+#ifndef DTRUJ_SIM_H
+#define DTRUJ_SIM_H
+
+#include <atomic>
+#include <condition_variable>
+#include <cstdarg>
+#include <deque>
+#include <map>
+#include <mutex>
+#include <string>
+#include <thread>
+#include <vector>
+
+#include "dtruj.h"
+
+#define DTRUJ_API extern "C" __attribute__((visibility("default")))
+
+namespace OLMA {
+namespace Sim {
+
+// What an injected fault does to the next call(s) of one entry.
+struct Fault {
+    std::string kind;       // null, error, hba, std, unknown, delay
+    int code = 1;
+    std::string message = "injected fault";
+    int delayMs = 0;
+    int remaining = -1;     // calls left; -1 means until cleared
+};
+
+// A diagnostic run posted through postDiagnostics and driven by startTests.
+// Its progress is computed from the clock when asked, so no thread is needed.
+struct DiagRun {
+    std::vector<Json::Value> tests;
+    bool started = false;
+    bool stopOnError = false;
+    bool cancelled = false;
+    double startTime = 0;
+    double cancelTime = 0;
+};
+
+struct State {
+    std::mutex mtx;                 // guards everything below but the event queue
+    bool loaded = false;
+    bool initialised = false;
+    std::string source;             // where the host description came from
+    Json::Value host;               // the simulated host; setters change it
+    std::map<std::string, Fault> faults;
+    std::map<std::string, double> resets;   // statistics key prefix -> time of reset
+    std::map<std::string, DiagRun> runs;
+    int lastRequestId = 0;
+    double startTime = 0;
+    std::vector<std::string> updateLog;
+
+    // Events: a queue filled by injections, setters and the event source
+    // file, emptied by the library's own thread.
+    std::mutex evMtx;
+    std::condition_variable evCv;
+    std::deque<std::string> evQueue;
+    bool evRegistered = false;
+    bool evStop = false;
+    std::thread evThread;
+    off_t evFileOffset = 0;
+};
+
+State& state();
+double now();
+
+std::atomic<EventProcessCB>& eventCallback();
+std::atomic<LogMsgCB>& logCallback();
+
+// Library log lines go through the module's callback if it registered one.
+void simLog(int level, const char* file, int line, const char* fmt, ...)
+    __attribute__((format(printf, 4, 5)));
+#define SIMLOG(level, ...) ::OLMA::Sim::simLog(level, __FILE__, __LINE__, __VA_ARGS__)
+enum { SL_DEBUG = 1, SL_INFO = 2, SL_WARN = 3, SL_ERROR = 4 };
+
+// Host description.
+bool loadHost(State& s, std::string& err);       // caller holds s.mtx
+bool parseHost(const std::string& text, Json::Value& host, std::string& err);
+void normaliseHost(Json::Value& host);
+const char* builtinHostText();
+
+// Errors as the library answers them: an object with "error".
+Json::Value errorReply(int code, const std::string& message);
+Json::Value okReply(const std::string& message);
+
+bool sameAddr(const std::string& a, const std::string& b);
+std::string plainAddr(const std::string& colon);
+std::string str(const Json::Value& v, const char* member);
+
+// Look-ups in the host. Each returns null when nothing matches.
+Json::Value* findAdapter(State& s, const std::string& addr, int* id = nullptr);
+Json::Value* findFcPort(State& s, const std::string& wwn, Json::Value** adapter = nullptr);
+Json::Value* findEthPort(State& s, const std::string& mac, Json::Value** adapter = nullptr);
+Json::Value* findVport(Json::Value& port, const std::string& vwwn);
+Json::Value* findRemotePort(Json::Value& port, const std::string& lwwn, const std::string& rwwn);
+std::string adapterIndex(const Json::Value& adapter);
+bool adapterIsCNA(const Json::Value& adapter);
+
+// Replies built from the host.
+Json::Value hbaReply(State& s, Json::Value& adapter, int id);
+Json::Value fcPortReply(const Json::Value& adapter, const Json::Value& port);
+Json::Value ethPortReply(const Json::Value& adapter, const Json::Value& port);
+bool lunVisible(const Json::Value& port, const std::string& rwwn, unsigned number);
+
+// Counters that grow with time since their last reset.
+uint64_t counterValue(State& s, const std::string& key, const std::string& name);
+Json::Value counters(State& s, const std::string& key, const char* const* names);
+void resetCounters(State& s, const std::string& keyPrefix);
+
+// Events.
+void queueEvent(State& s, const std::string& json);
+void portEvent(State& s, int category, int id, const std::string& portAddr,
+               const char* idValue, int severity, const char* msg);
+bool startEvents(State& s, bool dropOld);
+void stopEvents(State& s);
+
+// Faults. takeFault picks the fault of an entry for this call, if any.
+bool takeFault(State& s, const char* entry, Fault& f);
+bool parseFault(const Json::Value& v, Fault& f, std::string& err);
+
+} // namespace Sim
+} // namespace OLMA
+
+#endif
