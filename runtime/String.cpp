@@ -216,15 +216,21 @@ void String::append(const char* data, size_t size)
         return;
 
     // Keeps the text alive if data points into it and reserve() moves it.
-    __String_Rep* hold = _rep;
-    _ref(hold);
+    __String_Rep* hold = 0;
+
+    if (data >= _rep->data && data < _rep->data + _rep->cap + 1)
+    {
+        hold = _rep;
+        _ref(hold);
+    }
 
     reserve(_next_pow_2((size_t)_rep->size + size));
     memmove(_rep->data + _rep->size, data, size);
     _rep->size += (uint32)size;
     _rep->data[_rep->size] = '\0';
 
-    _unref(hold);
+    if (hold)
+        _unref(hold);
 }
 
 void String::append(const String& x)
