@@ -1,0 +1,194 @@
+// The six interop providers as their dispatch function calls them: what
+// reaches the handler, what happens when the handler stops early, and the
+// operations that they refuse.
+
+#include <gtest/gtest.h>
+#include <string>
+#include <vector>
+
+#include "VESPERA_RegisteredProfile_Provider.h"
+#include "VESPERA_RegisteredSubProfile_Provider.h"
+#include "VESPERA_Namespace_Provider.h"
+#include "VESPERA_ObjectManager_Provider.h"
+#include "VESPERA_CIMXMLCommunicationMechanism_Provider.h"
+#include "VESPERA_ProfileSoftwareIdentity_Provider.h"
+
+using namespace OLMA;
+
+namespace
+{
+
+// Collects what a provider hands up, and says stop after `limit` instances.
+struct Sink
+{
+    std::vector<Instance*> got;
+    size_t limit = (size_t)-1;
+    int calls = 0;
+
+    ~Sink()
+    {
+        for (Instance* i : got)
+            unref(i);
+    }
+
+    static bool proc(Instance* instance, Enum_Instances_Status status, void* client_data)
+    {
+        Sink* s = static_cast<Sink*>(client_data);
+        s->calls++;
+        EXPECT_EQ(status, ENUM_INSTANCES_OK);
+        if (!instance)
+            return false;
+        s->got.push_back(instance);
+        return s->got.size() < s->limit;
+    }
+
+    std::vector<std::string> keys(const char* property) const
+    {
+        std::vector<std::string> v;
+        for (Instance* i : got)
+        {
+            const Meta_Property* mp = find_property(i->meta_class, property);
+            EXPECT_TRUE(mp != 0);
+            if (mp)
+                v.push_back(static_cast<Property<String>*>(__slot(i, mp->offset))->value.c_str());
+        }
+        return v;
+    }
+};
+
+template<class PROVIDER, class CLASS>
+Enum_Instances_Status enumerate(Sink& sink)
+{
+    PROVIDER provider;
+    EXPECT_EQ(provider.load(), LOAD_OK);
+    Enum_Instances_Handler<CLASS> handler(Sink::proc, &sink);
+    CLASS* model = create<CLASS>(false);
+    Enum_Instances_Status status = provider.enum_instances(model, &handler);
+    destroy(model);
+    EXPECT_EQ(provider.unload(), UNLOAD_OK);
+    return status;
+}
+
+template<class PROVIDER, class CLASS>
+void expectRefusals()
+{
+    PROVIDER provider;
+    CLASS* model = create<CLASS>(false);
+    CLASS* out = 0;
+    EXPECT_EQ(provider.get_instance(model, out), GET_INSTANCE_UNSUPPORTED);
+    EXPECT_EQ(out, nullptr);
+    EXPECT_EQ(provider.create_instance(model), CREATE_INSTANCE_UNSUPPORTED);
+    EXPECT_EQ(provider.delete_instance(model), DELETE_INSTANCE_UNSUPPORTED);
+    EXPECT_EQ(provider.modify_instance(model, model), MODIFY_INSTANCE_UNSUPPORTED);
+    destroy(model);
+}
+
+} // namespace
+
+TEST(ServerProviders, EachHandsUpItsInstancesInOrder)
+{
+    {
+        Sink s;
+        EXPECT_EQ((enumerate<VESPERA_RegisteredProfile_Provider, VESPERA_RegisteredProfile>(s)),
+            ENUM_INSTANCES_OK);
+        EXPECT_EQ(s.keys("InstanceID"), (std::vector<std::string>{
+            "SMI-S", "FC HBA", "Server", "Host Discovered Resources", "Storage HBA" }));
+    }
+    {
+        Sink s;
+        EXPECT_EQ((enumerate<VESPERA_RegisteredSubProfile_Provider, VESPERA_RegisteredSubProfile>(s)),
+            ENUM_INSTANCES_OK);
+        EXPECT_EQ(s.got.size(), 10u);
+        EXPECT_EQ(s.keys("InstanceID").front(), "FC Initiator Ports");
+        EXPECT_EQ(s.keys("InstanceID").back(), "FCoE Initiator Ports");
+    }
+    {
+        Sink s;
+        EXPECT_EQ((enumerate<VESPERA_Namespace_Provider, VESPERA_Namespace>(s)), ENUM_INSTANCES_OK);
+        EXPECT_EQ(s.keys("Name"), std::vector<std::string>{ "root/vespera" });
+    }
+    {
+        Sink s;
+        EXPECT_EQ((enumerate<VESPERA_ObjectManager_Provider, VESPERA_ObjectManager>(s)), ENUM_INSTANCES_OK);
+        EXPECT_EQ(s.keys("ElementName"), std::vector<std::string>{ "CIM Server" });
+    }
+    {
+        Sink s;
+        EXPECT_EQ((enumerate<VESPERA_CIMXMLCommunicationMechanism_Provider,
+            VESPERA_CIMXMLCommunicationMechanism>(s)), ENUM_INSTANCES_OK);
+        EXPECT_EQ(s.keys("Name"), std::vector<std::string>{ "CIM-XML" });
+    }
+    {
+        Sink s;
+        EXPECT_EQ((enumerate<VESPERA_ProfileSoftwareIdentity_Provider, VESPERA_ProfileSoftwareIdentity>(s)),
+            ENUM_INSTANCES_OK);
+        EXPECT_EQ(s.keys("InstanceID"), std::vector<std::string>{ "Vespera Adapter CIM Provider" });
+    }
+}
+
+TEST(ServerProviders, HandlerGetsItsOwnInstances)
+{
+    Sink s;
+    enumerate<VESPERA_RegisteredProfile_Provider, VESPERA_RegisteredProfile>(s);
+    ASSERT_FALSE(s.got.empty());
+    for (Instance* i : s.got)
+    {
+        EXPECT_EQ(i->refs, 1u);
+        EXPECT_EQ(i->meta_class, &VESPERA_RegisteredProfile::static_meta_class);
+    }
+}
+
+TEST(ServerProviders, StopWhenTheHandlerSaysSo)
+{
+    // The provider must neither call the handler again nor leak what it
+    // didn't send; the sanitizer build catches the latter.
+    Sink s;
+    s.limit = 2;
+    EXPECT_EQ((enumerate<VESPERA_RegisteredSubProfile_Provider, VESPERA_RegisteredSubProfile>(s)),
+        ENUM_INSTANCES_OK);
+    EXPECT_EQ(s.calls, 2);
+    EXPECT_EQ(s.keys("InstanceID"), (std::vector<std::string>{ "FC Initiator Ports", "Profile Registration" }));
+}
+
+TEST(ServerProviders, RefuseEverythingButEnumeration)
+{
+    expectRefusals<VESPERA_RegisteredProfile_Provider, VESPERA_RegisteredProfile>();
+    expectRefusals<VESPERA_RegisteredSubProfile_Provider, VESPERA_RegisteredSubProfile>();
+    expectRefusals<VESPERA_Namespace_Provider, VESPERA_Namespace>();
+    expectRefusals<VESPERA_ObjectManager_Provider, VESPERA_ObjectManager>();
+    expectRefusals<VESPERA_CIMXMLCommunicationMechanism_Provider, VESPERA_CIMXMLCommunicationMechanism>();
+    expectRefusals<VESPERA_ProfileSoftwareIdentity_Provider, VESPERA_ProfileSoftwareIdentity>();
+}
+
+TEST(ServerProviders, MethodsAreUnsupportedAndLeaveTheirOutputsAlone)
+{
+    Property<uint32> rv;
+    rv.value = 77;
+    rv.null = 1;
+    CIM_ConcreteJob* job = 0;
+    Property<uint16> state;
+    state.set(2);
+    Property<Datetime> timeout;
+    timeout.null = 1;
+
+    VESPERA_RegisteredProfile_Provider rp;
+    VESPERA_RegisteredSubProfile_Provider rsp;
+    EXPECT_EQ(rp.OpenConformantInstances(0, rv), INVOKE_METHOD_UNSUPPORTED);
+    EXPECT_EQ(rp.PullConformantInstances(0, rv), INVOKE_METHOD_UNSUPPORTED);
+    EXPECT_EQ(rp.CloseConformantInstances(0, rv), INVOKE_METHOD_UNSUPPORTED);
+    EXPECT_EQ(rsp.OpenConformantInstances(0, rv), INVOKE_METHOD_UNSUPPORTED);
+    EXPECT_EQ(rsp.PullConformantInstances(0, rv), INVOKE_METHOD_UNSUPPORTED);
+    EXPECT_EQ(rsp.CloseConformantInstances(0, rv), INVOKE_METHOD_UNSUPPORTED);
+
+    VESPERA_ObjectManager_Provider om;
+    EXPECT_EQ(om.RequestStateChange(0, state, job, timeout, rv), INVOKE_METHOD_UNSUPPORTED);
+    EXPECT_EQ(om.StartService(0, rv), INVOKE_METHOD_UNSUPPORTED);
+    EXPECT_EQ(om.StopService(0, rv), INVOKE_METHOD_UNSUPPORTED);
+    EXPECT_EQ(om.ChangeAffectedElementsAssignedSequence(0, rv), INVOKE_METHOD_UNSUPPORTED);
+
+    VESPERA_CIMXMLCommunicationMechanism_Provider cm;
+    EXPECT_EQ(cm.RequestStateChange(0, state, job, timeout, rv), INVOKE_METHOD_UNSUPPORTED);
+
+    EXPECT_EQ(job, nullptr);
+    EXPECT_EQ(rv.null, 1);
+}
