@@ -341,6 +341,14 @@ static bool _parse_reference(const char*& p, Instance* instance, const Meta_Refe
     if (!x)
         return false;
 
+    // The repository would find any class; a reference must point at the
+    // class it was declared with or a subclass of it.
+    if (!is_subclass(mr->meta_class, x->meta_class))
+    {
+        unref(x);
+        return false;
+    }
+
     Instance*& slot = *(Instance**)__slot(instance, mr->offset);
     unref(slot);
     slot = x;
