@@ -117,7 +117,7 @@ ssize_t find_feature_index(const Meta_Class* mc, const Meta_Feature* mf)
     return -1;
 }
 
-bool __has_feature(const Meta_Class* mc, uint32 type_mask)
+bool __has_meta_feature(const Meta_Class* mc, uint32 type_mask)
 {
     for (size_t i = 0; mc && i < mc->num_meta_features; i++)
     {

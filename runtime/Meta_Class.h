@@ -202,7 +202,17 @@ inline const Meta_Reference* find_reference(const Meta_Method* mm, const char* n
 // Index of the feature in mc->meta_features, or -1.
 ssize_t find_feature_index(const Meta_Class* mc, const Meta_Feature* mf);
 
-bool __has_feature(const Meta_Class* mc, uint32 type_mask);
+// True if any feature's flags meet the mask. Clang (and GCC from 14)
+// reserve the name __has_feature for a preprocessor operator, so the
+// function has its own name and the short one only where it is free.
+bool __has_meta_feature(const Meta_Class* mc, uint32 type_mask);
+
+#ifndef __has_feature
+inline bool __has_feature(const Meta_Class* mc, uint32 type_mask)
+{
+    return __has_meta_feature(mc, type_mask);
+}
+#endif
 
 // A class counts as a subclass of itself; everything is a subclass of
 // Instance.

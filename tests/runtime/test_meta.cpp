@@ -66,10 +66,10 @@ TEST(Meta, FindFeatureByNameAndKind)
     EXPECT_EQ(find_reference(reset, "job"), &_Test_Port_Reset_method_Job);
     EXPECT_NE(find_parameter(reset, "return_value"), (const Meta_Property*)0);
 
-    EXPECT_TRUE(__has_feature(port, FLAG_METHOD));
-    EXPECT_FALSE(__has_feature(device, FLAG_METHOD));
-    EXPECT_TRUE(__has_feature(&Test_Dependency::static_meta_class, FLAG_REFERENCE));
-    EXPECT_FALSE(__has_feature(&Instance::static_meta_class, FLAG_ANY_FEATURE));
+    EXPECT_TRUE(__has_meta_feature(port, FLAG_METHOD));
+    EXPECT_FALSE(__has_meta_feature(device, FLAG_METHOD));
+    EXPECT_TRUE(__has_meta_feature(&Test_Dependency::static_meta_class, FLAG_REFERENCE));
+    EXPECT_FALSE(__has_meta_feature(&Instance::static_meta_class, FLAG_ANY_FEATURE));
 }
 
 TEST(Meta, IsSubclass)
