@@ -169,12 +169,6 @@ String hostString()
     return String(host);
 }
 
-template<class T>
-T* createInstance()
-{
-    return create<T>(true);
-}
-
 enum Interop_Answer
 {
     INTEROP_FAILED,
@@ -182,11 +176,11 @@ enum Interop_Answer
     INTEROP_FOUND,
 };
 
-// Asks the CIM server for its own object manager. On INTEROP_FOUND the three
-// properties hold the first instance's ElementName, Description and Name,
-// each with its null state; otherwise they are left alone.
+// Asks the CIM server for its own object manager. On INTEROP_FOUND the
+// properties given take the first instance's ElementName, Description and
+// Name, each with its null state; otherwise they are left alone.
 Interop_Answer askObjectManager(
-    Property<String>& elementName, Property<String>& description, Property<String>& name)
+    Property<String>* elementName, Property<String>* description, Property<String>* name)
 {
     CIM_ObjectManager* model = create<CIM_ObjectManager>(true);
     Interop_Answer answer = INTEROP_FAILED;
@@ -207,9 +201,12 @@ Interop_Answer askObjectManager(
             const CIM_ObjectManager* om = checked_cast<CIM_ObjectManager>(first.ptr());
             if (om)
             {
-                elementName = om->ElementName;
-                description = om->Description;
-                name = om->Name;
+                if (elementName)
+                    *elementName = om->ElementName;
+                if (description)
+                    *description = om->Description;
+                if (name)
+                    *name = om->Name;
                 answer = INTEROP_FOUND;
             }
             else
@@ -292,7 +289,7 @@ static void fillProfiles(Array<Instance*>& result, const Profile_Row* rows, size
 {
     for (size_t i = 0; i < count; i++)
     {
-        T* p = createInstance<T>();
+        T* p = create<T>(true);
         p->InstanceID.set(rows[i].name);
         p->RegisteredName.set(rows[i].name);
         p->Caption.set(rows[i].elementName);
@@ -323,7 +320,7 @@ Array<Instance*> ServerManager::getRegisteredSubProfileInstances()
 
 Array<Instance*> ServerManager::getNamespaceInstances()
 {
-    VESPERA_Namespace* ns = createInstance<VESPERA_Namespace>();
+    VESPERA_Namespace* ns = create<VESPERA_Namespace>(true);
     ns->SystemCreationClassName.set(className(ID_VESPERA_ComputerSystem));
     ns->SystemName.set(hostString());
     ns->ObjectManagerCreationClassName.set(className(ID_VESPERA_ObjectManager));
@@ -333,9 +330,7 @@ Array<Instance*> ServerManager::getNamespaceInstances()
     ns->ClassType.set(2);
     ns->ClassTypeVersion.set("2.26.0");
 
-    Property<String> elementName = ns->ObjectManagerName;
-    Property<String> description = ns->ObjectManagerName;
-    if (askObjectManager(elementName, description, ns->ObjectManagerName) == INTEROP_FAILED)
+    if (askObjectManager(0, 0, &ns->ObjectManagerName) == INTEROP_FAILED)
         ns->ObjectManagerName.set(CIM_SERVER);
 
     Array<Instance*> result;
@@ -345,7 +340,7 @@ Array<Instance*> ServerManager::getNamespaceInstances()
 
 Array<Instance*> ServerManager::getObjectManagerInstance()
 {
-    VESPERA_ObjectManager* om = createInstance<VESPERA_ObjectManager>();
+    VESPERA_ObjectManager* om = create<VESPERA_ObjectManager>(true);
     om->SystemCreationClassName.set(className(ID_VESPERA_ComputerSystem));
     om->SystemName.set(hostString());
     om->CreationClassName.set(className(ID_VESPERA_ObjectManager));
@@ -353,7 +348,7 @@ Array<Instance*> ServerManager::getObjectManagerInstance()
     putArray<uint16>(om->OperationalStatus, STATUS_OK);
     om->Started.set(true);
 
-    if (askObjectManager(om->Caption, om->Description, om->Name) == INTEROP_FAILED)
+    if (askObjectManager(&om->Caption, &om->Description, &om->Name) == INTEROP_FAILED)
     {
         om->Name.set(CIM_SERVER);
         om->Caption.set(CIM_SERVER);
@@ -368,7 +363,7 @@ Array<Instance*> ServerManager::getObjectManagerInstance()
 Array<Instance*> ServerManager::getCIMXMLCommunicationMechanismInstance()
 {
     VESPERA_CIMXMLCommunicationMechanism* cm =
-        createInstance<VESPERA_CIMXMLCommunicationMechanism>();
+        create<VESPERA_CIMXMLCommunicationMechanism>(true);
     cm->SystemCreationClassName.set(className(ID_VESPERA_ComputerSystem));
     cm->SystemName.set(hostString());
     cm->CreationClassName.set(className(ID_VESPERA_CIMXMLCommunicationMechanism));
@@ -390,7 +385,7 @@ Array<Instance*> ServerManager::getCIMXMLCommunicationMechanismInstance()
 
 Array<Instance*> ServerManager::getProfileSoftwareIdentityInstances()
 {
-    VESPERA_ProfileSoftwareIdentity* si = createInstance<VESPERA_ProfileSoftwareIdentity>();
+    VESPERA_ProfileSoftwareIdentity* si = create<VESPERA_ProfileSoftwareIdentity>(true);
     si->InstanceID.set(PROVIDER_IDENTITY);
     si->Caption.set(PROVIDER_IDENTITY);
     si->ElementName.set(PROVIDER_IDENTITY);
@@ -418,7 +413,7 @@ Array<Instance*> ServerManager::getProfileSoftwareIdentityInstances()
 
 Array<Instance*> ServerManager::getAgentServiceInstances()
 {
-    VESPERA_AgentService* as = createInstance<VESPERA_AgentService>();
+    VESPERA_AgentService* as = create<VESPERA_AgentService>(true);
     as->Name.set(AGENT_SERVICE_NAME);
 
     Array<Instance*> result;

@@ -1,0 +1,231 @@
+// The interop classes as a WBEM client sees them: the built module loaded
+// into the stand-in CIM server. The same tests run once with the adapter
+// library's directory in LD_LIBRARY_PATH and once without it, since nothing
+// here may depend on the library.
+
+#include <gtest/gtest.h>
+#include <dlfcn.h>
+#include <cstdio>
+#include <cstdlib>
+#include <cstring>
+#include <string>
+#include <vector>
+
+#include "cimhost.h"
+
+namespace ch = OLMA::cimhost;
+
+namespace
+{
+
+class Interop : public ::testing::Test
+{
+protected:
+    static ch::Host* host;
+
+    static void SetUpTestSuite()
+    {
+        host = new ch::Host(ch::Options());
+    }
+
+    static void TearDownTestSuite()
+    {
+        delete host;
+        host = 0;
+    }
+
+    void SetUp() override
+    {
+        ASSERT_TRUE(host->ok()) << host->error();
+        host->set_interop(true);
+    }
+
+    static ch::Result ei(const std::string& ns, const std::string& cls)
+    {
+        ch::Object_Path path;
+        path.name_space = ns;
+        path.class_name = cls;
+        return host->ei(path);
+    }
+
+    static ch::Result served(const std::string& cls)
+    {
+        ch::Result r = ei("root/vespera", cls);
+        EXPECT_EQ(r.rc, CMPI_RC_OK) << cls << ": " << ch::rc_name(r.rc) << " " << r.message;
+        return r;
+    }
+
+    static std::vector<std::string> column(const ch::Result& r, const char* property)
+    {
+        std::vector<std::string> v;
+        for (const ch::Instance& i : r.instances)
+            v.push_back(i.get_text(property));
+        return v;
+    }
+
+    static const ch::Value& get(const ch::Instance& i, const char* property)
+    {
+        static const ch::Value absent;
+        const ch::Value* v = i.get(property);
+        EXPECT_TRUE(v != 0) << "no property " << property << " in " << i.class_name;
+        return v ? *v : absent;
+    }
+};
+
+ch::Host* Interop::host = 0;
+
+} // namespace
+
+TEST_F(Interop, AdapterLibraryIsAsTheRunExpects)
+{
+    // Loading the module brings the library in if it can be found, so the
+    // two runs really differ.
+    const char* path = getenv("LD_LIBRARY_PATH");
+    bool expected = path && strstr(path, "platform/dtruj");
+    void* lib = dlopen("libdtruj.so", RTLD_NOW | RTLD_NOLOAD);
+    EXPECT_EQ(lib != 0, expected);
+    if (lib)
+        dlclose(lib);
+}
+
+TEST_F(Interop, RegisteredProfiles)
+{
+    ch::Result r = served("VESPERA_RegisteredProfile");
+    EXPECT_EQ(column(r, "InstanceID"), (std::vector<std::string>{
+        "SMI-S", "FC HBA", "Server", "Host Discovered Resources", "Storage HBA" }));
+    EXPECT_EQ(column(r, "ElementName"), (std::vector<std::string>{
+        "SMI-S", "FC HBA Profile", "Server Profile", "Host Discovered Resources Profile",
+        "Storage HBA Profile" }));
+    EXPECT_EQ(column(r, "RegisteredVersion"), (std::vector<std::string>{
+        "1.2.0", "1.2.0", "1.2.0", "1.2.0", "1.3.0" }));
+    for (const ch::Instance& i : r.instances)
+    {
+        EXPECT_EQ(i.class_name, "VESPERA_RegisteredProfile");
+        EXPECT_EQ(i.get_text("RegisteredOrganization"), "11");
+        EXPECT_EQ(i.get_text("AdvertiseTypes"), "{3}");
+        EXPECT_EQ(i.get_text("Caption"), i.get_text("ElementName"));
+    }
+}
+
+TEST_F(Interop, RegisteredSubProfiles)
+{
+    ch::Result r = served("VESPERA_RegisteredSubProfile");
+    EXPECT_EQ(column(r, "InstanceID"), (std::vector<std::string>{
+        "FC Initiator Ports", "Profile Registration", "Access Points", "Software Update",
+        "Software Inventory", "Physical Asset", "Ethernet Port", "Diagnostics Profile",
+        "Host LAN Network Port", "FCoE Initiator Ports" }));
+    EXPECT_EQ(column(r, "RegisteredOrganization"), (std::vector<std::string>{
+        "11", "11", "11", "2", "2", "2", "2", "2", "2", "11" }));
+    EXPECT_EQ(column(r, "RegisteredVersion"), (std::vector<std::string>{
+        "1.2.0", "1.0.0", "1.2.0", "1.0.0", "1.0.0", "1.0.2", "1.0.0", "2.0.0", "1.0.0", "1.0.0" }));
+    ASSERT_EQ(r.instances.size(), 10u);
+    EXPECT_EQ(r.instances[7].get_text("ElementName"), "Diagnostics Profile");
+}
+
+TEST_F(Interop, OneProfileByItsKey)
+{
+    // The providers only enumerate; the bridge finds one instance by key.
+    ch::Object_Path path;
+    std::string err;
+    ASSERT_TRUE(ch::parse_path("root/vespera:VESPERA_RegisteredProfile.InstanceID=\"Server\"", path, err)) << err;
+    ch::Result r = host->gi(path);
+    ASSERT_EQ(r.rc, CMPI_RC_OK) << ch::rc_name(r.rc) << " " << r.message;
+    ASSERT_EQ(r.instances.size(), 1u);
+    EXPECT_EQ(r.instances[0].get_text("ElementName"), "Server Profile");
+
+    ASSERT_TRUE(ch::parse_path("root/vespera:VESPERA_RegisteredProfile.InstanceID=\"server\"", path, err)) << err;
+    EXPECT_EQ(host->gi(path).rc, CMPI_RC_ERR_NOT_FOUND);
+}
+
+TEST_F(Interop, CommunicationMechanismAndIdentityAndAgentService)
+{
+    ch::Result cm = served("VESPERA_CIMXMLCommunicationMechanism");
+    ASSERT_EQ(cm.instances.size(), 1u);
+    const ch::Instance& c = cm.instances[0];
+    EXPECT_EQ(c.get_text("Name"), "CIM-XML");
+    EXPECT_EQ(c.get_text("CreationClassName"), "VESPERA_CIMXMLCommunicationMechanism");
+    EXPECT_EQ(c.get_text("SystemCreationClassName"), "VESPERA_ComputerSystem");
+    EXPECT_EQ(c.get_text("FunctionalProfilesSupported"), "{2, 3, 4, 5, 6, 8, 9}");
+    EXPECT_EQ(c.get_text("AuthenticationMechanismsSupported"), "{3}");
+    EXPECT_EQ(c.get_text("Version"), "1.2");
+    EXPECT_EQ(c.get_text("CIMValidated"), "true");
+    EXPECT_FALSE(get(c, "SystemName").null);
+
+    ch::Result si = served("VESPERA_ProfileSoftwareIdentity");
+    ASSERT_EQ(si.instances.size(), 1u);
+    const ch::Instance& s = si.instances[0];
+    EXPECT_EQ(s.get_text("VersionString"), VSPR_BUILD_VERSION);
+    unsigned major = 0, minor = 0, revision = 0;
+    ASSERT_EQ(sscanf(VSPR_BUILD_VERSION, "%u.%u.%u", &major, &minor, &revision), 3);
+    EXPECT_EQ(s.get_text("MajorVersion"), std::to_string(major));
+    EXPECT_EQ(s.get_text("MinorVersion"), std::to_string(minor));
+    EXPECT_EQ(s.get_text("RevisionNumber"), std::to_string(revision));
+    EXPECT_EQ(s.get_text("Classifications"), "{32775}");
+    EXPECT_EQ(s.get_text("IdentityInfoValue"), "{\"Vespera Adapter CIM Provider\", \"Primary\"}");
+
+    ch::Result as = served("VESPERA_AgentService");
+    EXPECT_EQ(column(as, "Name"), std::vector<std::string>{ "Vespera Agent Service Provider" });
+}
+
+TEST_F(Interop, ObjectManagerAndNamespaceTakeTheServersAnswer)
+{
+    ch::Result server = ei("root/PG_InterOp", "CIM_ObjectManager");
+    ASSERT_EQ(server.rc, CMPI_RC_OK) << ch::rc_name(server.rc);
+    ASSERT_FALSE(server.instances.empty());
+    const ch::Instance& first = server.instances[0];
+
+    ch::Result om = served("VESPERA_ObjectManager");
+    ASSERT_EQ(om.instances.size(), 1u);
+    const ch::Instance& o = om.instances[0];
+    EXPECT_EQ(get(o, "Name"), get(first, "Name"));
+    EXPECT_EQ(get(o, "Caption"), get(first, "ElementName"));
+    EXPECT_EQ(get(o, "Description"), get(first, "Description"));
+    EXPECT_EQ(o.get_text("ElementName"), "CIM Server");
+    EXPECT_EQ(o.get_text("Started"), "true");
+    EXPECT_EQ(o.get_text("OperationalStatus"), "{2}");
+    EXPECT_EQ(o.get_text("CreationClassName"), "VESPERA_ObjectManager");
+
+    ch::Result ns = served("VESPERA_Namespace");
+    ASSERT_EQ(ns.instances.size(), 1u);
+    const ch::Instance& n = ns.instances[0];
+    EXPECT_EQ(get(n, "ObjectManagerName"), get(first, "Name"));
+    EXPECT_EQ(n.get_text("Name"), "root/vespera");
+    EXPECT_EQ(n.get_text("ClassTypeVersion"), "2.26.0");
+    EXPECT_EQ(n.get_text("ClassInfo"), "11");
+    EXPECT_EQ(n.get_text("SystemName"), o.get_text("SystemName"));
+}
+
+TEST_F(Interop, ServerThatCantBeAskedIsCalledCIMServer)
+{
+    host->set_interop(false);
+    ch::Result om = served("VESPERA_ObjectManager");
+    ASSERT_EQ(om.instances.size(), 1u);
+    for (const char* p : { "Name", "Caption", "Description", "ElementName" })
+        EXPECT_EQ(om.instances[0].get_text(p), "CIM Server") << p;
+
+    ch::Result ns = served("VESPERA_Namespace");
+    ASSERT_EQ(ns.instances.size(), 1u);
+    EXPECT_EQ(ns.instances[0].get_text("ObjectManagerName"), "CIM Server");
+}
+
+TEST_F(Interop, ServerWithoutObjectManagerLeavesItsValuesNull)
+{
+    host->set_interop(true, true);
+    ch::Result om = served("VESPERA_ObjectManager");
+    ASSERT_EQ(om.instances.size(), 1u);
+    for (const char* p : { "Name", "Caption", "Description" })
+        EXPECT_TRUE(get(om.instances[0], p).null) << p;
+    EXPECT_EQ(om.instances[0].get_text("ElementName"), "CIM Server");
+
+    ch::Result ns = served("VESPERA_Namespace");
+    ASSERT_EQ(ns.instances.size(), 1u);
+    EXPECT_TRUE(get(ns.instances[0], "ObjectManagerName").null);
+}
+
+TEST_F(Interop, MethodsAreRefused)
+{
+    ch::Result om = served("VESPERA_ObjectManager");
+    ASSERT_EQ(om.instances.size(), 1u);
+    ch::Result r = host->cm(om.instances[0].path, "StartService", {});
+    EXPECT_EQ(r.rc, CMPI_RC_ERR_NOT_SUPPORTED) << ch::rc_name(r.rc) << " " << r.message;
+}
