@@ -20,6 +20,8 @@ import hashlib
 import os
 import sys
 
+# Keep the source tree free of compiled modules.
+sys.dont_write_bytecode = True
 sys.path.insert(0, os.path.dirname(os.path.abspath(__file__)))
 
 import mof  # noqa: E402
@@ -163,17 +165,35 @@ class Cls:
         return sum(1 for f in self.features if f.flags & F_KEY)
 
 
+# The scopes under which a qualifier may stand on each kind of element.
+SCOPES = {
+    'class': ('class', 'association', 'indication', 'any'),
+    'property': ('property', 'any'),
+    'reference': ('reference', 'any'),
+    'method': ('method', 'any'),
+    'parameter': ('parameter', 'any'),
+}
+
+
 def _qualifier_bits(quals, decls, scope, where):
-    """Returns (set, cleared, restricted) flag masks from a qualifier list."""
+    """Returns (set, cleared, restricted) flag masks from a qualifier list.
+
+    Every qualifier must be declared and allowed on the element, as a CIM
+    server would insist when it compiles the MOF.
+    """
     set_bits = 0
     cleared = 0
     restricted = 0
     for q in quals:
+        decl = decls.get(q.name.lower())
+        if decl is None:
+            raise GenError('%s: undeclared qualifier %s' % (where, q.name))
+        if not any(sc in decl.scopes for sc in SCOPES[scope]):
+            raise GenError('%s: qualifier %s is not allowed on a %s' % (where, q.name, scope))
         low = q.name.lower()
         bit = FLAG_BIT.get(low)
         if bit is None or bit & KIND_BITS:
             continue
-        decl = decls.get(low)
         if low == 'embeddedinstance':
             on = q.value is not None and q.value.kind == 'string'
         else:
@@ -187,7 +207,7 @@ def _qualifier_bits(quals, decls, scope, where):
             set_bits |= bit
         else:
             cleared |= bit
-        if decl is not None and decl.restricted():
+        if decl.restricted():
             restricted |= bit
     return set_bits, cleared, restricted
 
@@ -285,8 +305,6 @@ class Model:
             set_b, clr_b, restr = _qualifier_bits(f.qualifiers, self.decls, 'method', where)
             flags = F_METHOD | ((inherited.flags & ~inherited.restricted) if inherited else self.method_true)
             flags = (flags | set_b) & ~clr_b
-            if f.type not in TYPES or f.type in ('string', 'datetime') and False:
-                raise GenError('%s: bad return type %s' % (where, f.type))
             if f.type not in TYPES:
                 raise GenError('%s: bad return type %s' % (where, f.type))
             params = []
@@ -534,9 +552,10 @@ class Writer:
         else:
             L.append('#include "Instance.h"')
         L += ['', 'namespace OLMA', '{', '']
+        # Only what the parent lacks gets a member; an override keeps the
+        # parent's slot.
         new = [f for f, loc in zip(c.features, c.locals)
-               if loc and f.kind != 'method' and f.origin == c.name and f.member == f.name
-               and not self._inherited_member(c, f)]
+               if loc and f.kind != 'method' and not self._inherited_member(c, f)]
         methods = [f for f, loc in zip(c.features, c.locals) if loc and f.kind == 'method']
         fwd = set()
         for f in new:
@@ -604,7 +623,7 @@ class Writer:
             elems = ', '.join(c_literal(f.type, x) for x in lit.value)
             if lit.value:
                 L.append('static const %s %s_elements[] = { %s };' % (
-                    ltype if ltype != 'const char*' else 'const char*', sym, elems))
+                    'char* const' if ltype == 'const char*' else ltype, sym, elems))
                 L.append('static const Meta_Value_Array<%s> %s_value = { {}, %s_elements, %d };'
                          % (ltype, sym, sym, len(lit.value)))
             else:
