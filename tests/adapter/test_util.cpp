@@ -1,6 +1,5 @@
-// ProviderUtil against the simulated adapter library (default host, bound
-// at start-up through LD_LIBRARY_PATH) and against hand-made replies put in
-// place of single entries.
+// ProviderUtil against the simulated adapter library (its default host) and
+// against hand-made replies put in place of single entries.
 
 #include <gtest/gtest.h>
 
@@ -15,6 +14,9 @@
 #include "InProcessLog.h"
 #include "ProviderInit.h"
 #include "ProviderUtil.h"
+
+// The simulator's own switches.
+extern "C" int dtruj_sim_set_fault(const char* entry, const char* kind);
 
 using namespace OLMA;
 using adapter_test::InProcessLog;
@@ -95,7 +97,7 @@ protected:
     void SetUp() override
     {
         ProviderUtilTest::SetUp();
-        ASSERT_TRUE(gTrujLibLoaded) << "libdtruj.so must be on LD_LIBRARY_PATH";
+        ASSERT_TRUE(gTrujLibLoaded) << "the start-up didn't load libdtruj.so";
     }
 };
 
@@ -418,6 +420,36 @@ TEST_F(ProviderUtilSimTest, LibraryExceptionsStayInside)
         ScopedEntry fake(libGetAdapterId, throwStd);
         EXPECT_EQ((unsigned)-1, util()->getAdapterIdByIndexStr(FC_HBA_WWN));
     }
+}
+
+TEST_F(ProviderUtilSimTest, FaultsOfTheRealLibraryAreCaught)
+{
+    // Thrown inside libdtruj.so, caught by type in our code.
+    struct { const char* fault; const char* line; } cases[] = {
+        { "{\"kind\": \"hba\", \"code\": 9, \"message\": \"no such HBA\"}",
+          "libGetHbaByWwn got User exception 9: no such HBA" },
+        { "std", "libGetHbaByWwn got std exception: " },
+        { "unknown", "libGetHbaByWwn got default exception" },
+        { "null", "Unable to get adapater details for 200000051e8a1000" },
+        { "error", "Unable to get adapater details for 200000051e8a1000" },
+    };
+
+    for (auto& c : cases)
+    {
+        ASSERT_EQ(0, dtruj_sim_set_fault("getHbaByWwn", c.fault));
+        InProcessLog log;
+        Json::Value reply;
+        EXPECT_EQ(-1, util()->getAdapterDetails("200000051e8a1000", reply)) << c.fault;
+        EXPECT_EQ(1u, countLines(log.text(), {"ERR: ", c.line})) << c.fault << log.text();
+        dtruj_sim_set_fault("getHbaByWwn", "none");
+    }
+
+    ASSERT_EQ(0, dtruj_sim_set_fault("getAllAdaptersIndexString", "error"));
+    Json::Value reply;
+    EXPECT_EQ(-1, util()->getNumberOfAdapters(reply));
+    EXPECT_STREQ("", util()->getDriverVersion().c_str());
+    dtruj_sim_set_fault("getAllAdaptersIndexString", "none");
+    EXPECT_EQ(2, util()->getNumberOfAdapters(reply));
 }
 
 TEST_F(ProviderUtilSimTest, SerialNumberRules)
