@@ -1,0 +1,524 @@
+// cimhost: try a CMPI provider module from the command line, without a CIM
+// server. Verbs follow the wbemcli client; see usage() for all of them.
+
+#include <chrono>
+#include <cstdio>
+#include <cstdlib>
+#include <cstring>
+#include <iostream>
+#include <string>
+#include <thread>
+#include <vector>
+
+#include <json/json.h>
+
+#include "cimhost.h"
+#include "internal.h"
+
+using namespace OLMA::cimhost;
+
+namespace
+{
+
+const char usage_text[] =
+    "usage: cimhost [OPTIONS] VERB ARGS...\n"
+    "\n"
+    "Loads a CMPI provider module, as a CIM server would, and runs one operation\n"
+    "on it. Paths are in the CIM text form NAMESPACE:CLASS.KEY=VALUE,...; string\n"
+    "values are quoted, references are quoted paths.\n"
+    "\n"
+    "Verbs:\n"
+    "  ei NS:CLASS           enumerate instances\n"
+    "      cimhost ei root/vespera:VESPERA_FCPort\n"
+    "  ein NS:CLASS          enumerate instance names (paths, one per line)\n"
+    "      cimhost ein root/vespera:VESPERA_PortController\n"
+    "  gi PATH               get one instance\n"
+    "      cimhost gi 'root/vespera:VESPERA_FCPort.CreationClassName=\"VESPERA_FCPort\","
+    "DeviceID=\"10000000C9A1B2C3\",SystemCreationClassName=\"VESPERA_ComputerSystem\","
+    "SystemName=\"host1\"'\n"
+    "  ai PATH               associators of an object\n"
+    "      cimhost ai --assoc-class VESPERA_ControlledBy 'root/vespera:VESPERA_FCPort.DeviceID=\"x\"'\n"
+    "  an PATH               associator names\n"
+    "      cimhost an --result-class VESPERA_PortController 'root/vespera:VESPERA_FCPort.DeviceID=\"x\"'\n"
+    "  ri PATH               references (association instances) of an object\n"
+    "      cimhost ri --result-class VESPERA_ControlledBy --role Dependent 'root/vespera:...'\n"
+    "  rn PATH               reference names\n"
+    "      cimhost rn 'root/vespera:VESPERA_ComputerSystem.Name=\"host1\",CreationClassName=\"VESPERA_ComputerSystem\"'\n"
+    "  cm PATH METHOD [NAME=VALUE ...]\n"
+    "                        invoke a method; VALUE is TYPE:TEXT (TYPE one of boolean,\n"
+    "                        uint8..uint64, sint8..sint64, real32, real64, char16, string,\n"
+    "                        datetime, ref; TYPE[] for a comma-separated array) or plain\n"
+    "                        TEXT when the module's class tables give the parameter's type\n"
+    "      cimhost cm 'root/vespera:VESPERA_FCPort.DeviceID=\"x\"' RequestStateChange RequestedState=uint16:3\n"
+    "      cimhost cm 'root/vespera:VESPERA_AgentService.Name=\"a\"' executeMethod "
+    "'request=string:{\"method\":\"discovery.getAdapters\",\"id\":1}'\n"
+    "      cimhost cm PATH RequestStateChange 'Job=ref:root/vespera:VESPERA_ConcreteJob.InstanceID=\"j1\"'\n"
+    "  listen NS:CLASS       subscribe to indications and print each as it arrives\n"
+    "      cimhost listen root/vespera:VESPERA_AlertIndication --seconds 30\n"
+    "\n"
+    "Options:\n"
+    "  --module PATH         provider module to load (default: the built\n"
+    "                        libvsprprovider_Module.so, else found along LD_LIBRARY_PATH)\n"
+    "      cimhost --module ./libmyprov.so ei root/test:My_Class\n"
+    "  --reg FILE            SFCB-style registration file (default: schema/vsprprovider.reg)\n"
+    "      cimhost --reg my.reg ein root/test:My_Class\n"
+    "  --json                print one JSON document (paths, typed properties, return\n"
+    "                        value and out parameters) instead of text\n"
+    "      cimhost --json ei root/vespera:VESPERA_FCPort\n"
+    "  --props a,b           only these properties (ei, gi, ai, ri)\n"
+    "      cimhost ei root/vespera:VESPERA_FCPort --props DeviceID,PortType\n"
+    "  --assoc-class CLASS   association class filter (ai, an)\n"
+    "  --result-class CLASS  class of the other end (ai, an), of the association (ri, rn)\n"
+    "  --role NAME           the source object's role (ai, an, ri, rn)\n"
+    "  --result-role NAME    the other end's role (ai, an)\n"
+    "      cimhost an --role Dependent --result-role Antecedent PATH\n"
+    "  --seconds N           how long listen waits (default 10)\n"
+    "      cimhost listen root/vespera:VESPERA_AlertIndication --seconds 5\n"
+    "  --no-interop          don't serve root/PG_InterOp from the built-in object manager\n"
+    "      cimhost --no-interop ei root/vespera:VESPERA_ObjectManager\n"
+    "  --help                this text\n"
+    "\n"
+    "Exit status: 0 success; 1 the operation failed (the CMPI return code's name is\n"
+    "printed) or the module couldn't be loaded; 2 bad input.\n";
+
+struct Bad_Input
+{
+    std::string message;
+};
+
+[[noreturn]] void bad(const std::string& message)
+{
+    throw Bad_Input {message};
+}
+
+Json::Value json_of(const Value& v);
+
+Json::Value json_of(const Instance& inst)
+{
+    Json::Value j(Json::objectValue);
+    j["class"] = inst.class_name;
+    j["path"] = inst.path.to_string();
+    Json::Value props(Json::arrayValue);
+    for (const Property& p : inst.properties)
+    {
+        Json::Value jp(Json::objectValue);
+        jp["name"] = p.name;
+        jp["type"] = type_name(p.value.type);
+        jp["null"] = p.value.null;
+        jp["value"] = json_of(p.value);
+        props.append(jp);
+    }
+    j["properties"] = props;
+    return j;
+}
+
+Json::Value json_of(const Value& v)
+{
+    if (v.null)
+        return Json::Value();
+    if (v.is_array())
+    {
+        Json::Value a(Json::arrayValue);
+        for (const Value& e : v.elements)
+            a.append(json_of(e));
+        return a;
+    }
+    switch (v.type)
+    {
+    case CMPI_boolean: return Json::Value(v.num.boolean != 0);
+    case CMPI_uint8: return Json::Value(Json::UInt(v.num.uint8));
+    case CMPI_uint16: return Json::Value(Json::UInt(v.num.uint16));
+    case CMPI_uint32: return Json::Value(Json::UInt(v.num.uint32));
+    case CMPI_uint64: return Json::Value(Json::UInt64(v.num.uint64));
+    case CMPI_sint8: return Json::Value(Json::Int(v.num.sint8));
+    case CMPI_sint16: return Json::Value(Json::Int(v.num.sint16));
+    case CMPI_sint32: return Json::Value(Json::Int(v.num.sint32));
+    case CMPI_sint64: return Json::Value(Json::Int64(v.num.sint64));
+    case CMPI_char16: return Json::Value(Json::UInt(v.num.char16));
+    case CMPI_real32: return Json::Value(double(v.num.real32));
+    case CMPI_real64: return Json::Value(v.num.real64);
+    case CMPI_instance: return v.inst ? json_of(*v.inst) : Json::Value();
+    default: return Json::Value(v.text());
+    }
+}
+
+Json::Value json_typed(const Value& v)
+{
+    Json::Value j(Json::objectValue);
+    j["type"] = type_name(v.type);
+    j["null"] = v.null;
+    j["value"] = json_of(v);
+    return j;
+}
+
+struct Args
+{
+    std::string module, reg;
+    bool json = false;
+    bool interop = true;
+    std::string verb;
+    std::vector<std::string> positional;
+    bool has_props = false;
+    std::vector<std::string> props;
+    std::string assoc_class, result_class, role, result_role;
+    int seconds = 10;
+};
+
+std::vector<std::string> split_list(const std::string& s)
+{
+    std::vector<std::string> r;
+    std::string cur;
+    for (char c : s)
+    {
+        if (c == ',')
+        {
+            if (!cur.empty())
+                r.push_back(cur);
+            cur.clear();
+        }
+        else if (c != ' ')
+            cur += c;
+    }
+    if (!cur.empty())
+        r.push_back(cur);
+    return r;
+}
+
+Args read_args(int argc, char** argv)
+{
+    Args a;
+    static const char* const valued[] = {"--module", "--reg", "--props", "--assoc-class",
+                                         "--result-class", "--role", "--result-role", "--seconds"};
+    for (int i = 1; i < argc; i++)
+    {
+        std::string s = argv[i];
+        std::string opt = s, val;
+        bool inline_val = false;
+        if (s.compare(0, 2, "--") == 0 && s.find('=') != std::string::npos)
+        {
+            opt = s.substr(0, s.find('='));
+            val = s.substr(s.find('=') + 1);
+            inline_val = true;
+        }
+        bool takes = false;
+        for (const char* v : valued)
+            takes = takes || opt == v;
+        if (takes)
+        {
+            if (!inline_val)
+            {
+                if (i + 1 >= argc)
+                    bad("option " + opt + " needs a value");
+                val = argv[++i];
+            }
+            if (opt == "--module")
+                a.module = val;
+            else if (opt == "--reg")
+                a.reg = val;
+            else if (opt == "--props")
+            {
+                a.has_props = true;
+                a.props = split_list(val);
+            }
+            else if (opt == "--assoc-class")
+                a.assoc_class = val;
+            else if (opt == "--result-class")
+                a.result_class = val;
+            else if (opt == "--role")
+                a.role = val;
+            else if (opt == "--result-role")
+                a.result_role = val;
+            else
+            {
+                char* end = nullptr;
+                long n = strtol(val.c_str(), &end, 10);
+                if (val.empty() || *end || n < 0 || n > 86400)
+                    bad("--seconds needs a number of seconds, not '" + val + "'");
+                a.seconds = int(n);
+            }
+        }
+        else if (s == "--json")
+            a.json = true;
+        else if (s == "--no-interop")
+            a.interop = false;
+        else if (s.compare(0, 2, "--") == 0 && a.verb != "cm")
+            bad("unknown option " + s);
+        else if (a.verb.empty())
+            a.verb = s;
+        else
+            a.positional.push_back(s);
+    }
+    return a;
+}
+
+Object_Path read_path(Host& host, const std::string& text, bool class_only)
+{
+    Object_Path p;
+    std::string err;
+    if (!parse_path(text, p, err))
+        bad(err);
+    if (!host.knows_class(p.class_name))
+        bad("unknown class " + p.class_name);
+    if (class_only && !p.keys.empty())
+        bad("'" + text + "' names an instance; give NAMESPACE:CLASS");
+    host.type_keys(p);
+    return p;
+}
+
+void check_class(Host& host, const std::string& cls)
+{
+    if (!cls.empty() && !host.knows_class(cls))
+        bad("unknown class " + cls);
+}
+
+// A cm argument: typed by its prefix, else by the class tables.
+Property read_arg(Host& host, const Object_Path& path, const std::string& method,
+                  const std::string& text)
+{
+    size_t eq = text.find('=');
+    if (eq == std::string::npos || eq == 0)
+        bad("argument '" + text + "' is not NAME=VALUE");
+    Property p;
+    p.name = text.substr(0, eq);
+    std::string value = text.substr(eq + 1);
+    std::string err;
+    size_t colon = value.find(':');
+    std::string prefix = colon == std::string::npos ? "" : value.substr(0, colon);
+    if (prefix.size() > 2 && prefix.compare(prefix.size() - 2, 2, "[]") == 0)
+        prefix.resize(prefix.size() - 2);
+    if (!prefix.empty() && (type_of_name(prefix) || name_eq(prefix, "null")))
+    {
+        if (!parse_typed_value(value, p.value, err))
+            bad("argument " + p.name + ": " + err);
+    }
+    else
+    {
+        CMPIType t = host.parameter_type(path.class_name, method, p.name);
+        if (!t)
+            bad("argument " + p.name + ": untyped value; write " + p.name + "=TYPE:VALUE");
+        if (t == CMPI_instance || t == (CMPI_instance | CMPI_ARRAY))
+            bad("argument " + p.name + ": embedded instances can't be given on the command line");
+        if (!parse_value_as(t, value, p.value, err))
+            bad("argument " + p.name + ": " + err);
+    }
+    if (p.value.type == CMPI_ref && p.value.ref)
+    {
+        if (!host.knows_class(p.value.ref->class_name))
+            bad("argument " + p.name + ": unknown class " + p.value.ref->class_name);
+        host.type_keys(*p.value.ref);
+    }
+    return p;
+}
+
+void print_text(const Result& r, const std::string& verb)
+{
+    for (const Instance& i : r.instances)
+        std::cout << "// " << i.path.to_string() << "\n" << instance_mof(i) << ";\n\n";
+    for (const Object_Path& p : r.paths)
+        std::cout << p.to_string() << "\n";
+    if (verb == "cm")
+    {
+        std::cout << "ReturnValue = " << r.return_value.text() << "\n";
+        for (const Property& o : r.out)
+        {
+            if (!o.value.null && o.value.type == CMPI_instance && o.value.inst)
+                std::cout << o.name << " =\n" << instance_mof(*o.value.inst, 4) << "\n";
+            else
+                std::cout << o.name << " = " << o.value.text() << "\n";
+        }
+    }
+}
+
+Json::Value json_result(const Result& r, const std::string& verb)
+{
+    Json::Value j(Json::objectValue);
+    j["operation"] = verb;
+    j["rc"] = int(r.rc);
+    j["rc_name"] = rc_name(r.rc);
+    j["message"] = r.message;
+    if (verb == "ein" || verb == "an" || verb == "rn")
+    {
+        Json::Value paths(Json::arrayValue);
+        for (const Object_Path& p : r.paths)
+            paths.append(p.to_string());
+        j["paths"] = paths;
+    }
+    else if (verb == "cm")
+    {
+        j["return_value"] = json_typed(r.return_value);
+        Json::Value out(Json::arrayValue);
+        for (const Property& o : r.out)
+        {
+            Json::Value jo = json_typed(o.value);
+            jo["name"] = o.name;
+            out.append(jo);
+        }
+        j["out"] = out;
+    }
+    else
+    {
+        Json::Value insts(Json::arrayValue);
+        for (const Instance& i : r.instances)
+            insts.append(json_of(i));
+        j["instances"] = insts;
+    }
+    return j;
+}
+
+int listen(Host& host, const Args& a)
+{
+    if (a.positional.size() != 1)
+        bad("listen takes one NS:CLASS");
+    Object_Path cls = read_path(host, a.positional[0], true);
+    int id = 0;
+    Result r = host.subscribe(cls.name_space, cls.class_name, id);
+    if (!r.ok())
+    {
+        std::cerr << "cimhost: " << rc_name(r.rc) << (r.message.empty() ? "" : ": ")
+                  << r.message << "\n";
+        if (id)
+            host.unsubscribe(id);
+        return 1;
+    }
+    if (!a.json)
+        std::cout << "listening for " << cls.class_name << " in " << cls.name_space << " for "
+                  << a.seconds << " s\n"
+                  << std::flush;
+    auto end = std::chrono::steady_clock::now() + std::chrono::seconds(a.seconds);
+    size_t shown = 0;
+    while (std::chrono::steady_clock::now() < end)
+    {
+        host.wait_indications(shown + 1, 200);
+        std::vector<Indication_Record> inds = host.indications();
+        for (; shown < inds.size() && !a.json; shown++)
+            std::cout << "// indication in " << inds[shown].name_space << "\n"
+                      << instance_mof(inds[shown].instance) << ";\n\n"
+                      << std::flush;
+    }
+    Result u = host.unsubscribe(id);
+    if (a.json)
+    {
+        Json::Value j(Json::objectValue);
+        j["operation"] = "listen";
+        j["rc"] = int(u.rc);
+        j["rc_name"] = rc_name(u.rc);
+        j["message"] = u.message;
+        Json::Value list(Json::arrayValue);
+        for (const Indication_Record& rec : host.indications())
+        {
+            Json::Value e(Json::objectValue);
+            e["namespace"] = rec.name_space;
+            e["instance"] = json_of(rec.instance);
+            list.append(e);
+        }
+        j["indications"] = list;
+        std::cout << Json::StyledWriter().write(j);
+    }
+    if (!u.ok())
+    {
+        std::cerr << "cimhost: " << rc_name(u.rc) << (u.message.empty() ? "" : ": ")
+                  << u.message << "\n";
+        return 1;
+    }
+    return 0;
+}
+
+int run(int argc, char** argv)
+{
+    for (int i = 1; i < argc; i++)
+        if (strcmp(argv[i], "--help") == 0 || strcmp(argv[i], "-h") == 0)
+        {
+            std::cout << usage_text;
+            return 0;
+        }
+    Args a = read_args(argc, argv);
+    static const char* const verbs[] = {"ei", "ein", "gi", "ai", "an", "ri", "rn", "cm", "listen"};
+    bool known = false;
+    for (const char* v : verbs)
+        known = known || a.verb == v;
+    if (a.verb.empty())
+        bad("no verb given (try --help)");
+    if (!known)
+        bad("unknown verb '" + a.verb + "' (try --help)");
+
+    Options opts;
+    opts.module_path = a.module;
+    opts.reg_path = a.reg;
+    opts.interop = a.interop;
+    Host host(opts);
+    if (!host.ok())
+    {
+        std::cerr << "cimhost: " << host.error() << "\n";
+        return 1;
+    }
+    if (a.verb == "listen")
+        return listen(host, a);
+
+    const std::vector<std::string>* props = a.has_props ? &a.props : nullptr;
+    Result r;
+    const std::string& v = a.verb;
+    if (v == "cm")
+    {
+        if (a.positional.size() < 2)
+            bad("cm takes PATH METHOD [NAME=VALUE ...]");
+        Object_Path p = read_path(host, a.positional[0], false);
+        std::vector<Property> in;
+        for (size_t i = 2; i < a.positional.size(); i++)
+            in.push_back(read_arg(host, p, a.positional[1], a.positional[i]));
+        r = host.cm(p, a.positional[1], in);
+    }
+    else
+    {
+        if (a.positional.size() != 1)
+            bad(v + " takes one " + (v == "ei" || v == "ein" ? "NS:CLASS" : "PATH"));
+        bool class_only = v == "ei" || v == "ein";
+        Object_Path p = read_path(host, a.positional[0], class_only);
+        check_class(host, a.assoc_class);
+        check_class(host, a.result_class);
+        if (v == "ei")
+            r = host.ei(p, props);
+        else if (v == "ein")
+            r = host.ein(p);
+        else if (v == "gi")
+            r = host.gi(p, props);
+        else if (v == "ai")
+            r = host.ai(p, a.assoc_class, a.result_class, a.role, a.result_role, props);
+        else if (v == "an")
+            r = host.an(p, a.assoc_class, a.result_class, a.role, a.result_role);
+        else if (v == "ri")
+            r = host.ri(p, a.result_class, a.role, props);
+        else
+            r = host.rn(p, a.result_class, a.role);
+    }
+    if (a.json)
+        std::cout << Json::StyledWriter().write(json_result(r, v));
+    else if (r.ok())
+        print_text(r, v);
+    if (!r.ok())
+    {
+        std::cerr << "cimhost: " << rc_name(r.rc) << (r.message.empty() ? "" : ": ")
+                  << r.message << "\n";
+        return 1;
+    }
+    return 0;
+}
+
+} // namespace
+
+int main(int argc, char** argv)
+{
+    try
+    {
+        return run(argc, argv);
+    }
+    catch (const Bad_Input& e)
+    {
+        std::cerr << "cimhost: " << e.message << "\n";
+        return 2;
+    }
+    catch (const std::exception& e)
+    {
+        std::cerr << "cimhost: " << e.what() << "\n";
+        return 1;
+    }
+}
