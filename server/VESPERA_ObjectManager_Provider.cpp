@@ -74,6 +74,9 @@ Invoke_Method_Status VESPERA_ObjectManager_Provider::StopService(
 
 Invoke_Method_Status VESPERA_ObjectManager_Provider::ChangeAffectedElementsAssignedSequence(
     const VESPERA_ObjectManager*,
+    const Property<Array<CIM_ManagedElement*> >&,
+    const Property<Array<uint16> >&,
+    CIM_ConcreteJob*&,
     Property<uint32>&)
 {
     return INVOKE_METHOD_UNSUPPORTED;

@@ -4,12 +4,13 @@
 #include "Provider.h"
 #include "VESPERA_ObjectManager.h"
 #include "CIM_ConcreteJob.h"
+#include "CIM_ManagedElement.h"
 
 namespace OLMA
 {
 
-// Serves VESPERA_ObjectManager, the CIM server that hosts the module. Read-
-// only: instances come from ServerManager, and no method does anything.
+// Serves VESPERA_ObjectManager, the CIM server that hosts the module.
+// Read-only: instances come from ServerManager, and no method does anything.
 class VESPERA_ObjectManager_Provider
 {
 public:
@@ -50,6 +51,9 @@ public:
 
     Invoke_Method_Status ChangeAffectedElementsAssignedSequence(
         const VESPERA_ObjectManager* self,
+        const Property<Array<CIM_ManagedElement*> >& ManagedElements,
+        const Property<Array<uint16> >& AssignedSequence,
+        CIM_ConcreteJob*& Job,
         Property<uint32>& return_value);
 };
 

@@ -7,8 +7,8 @@
 namespace OLMA
 {
 
-// Serves VESPERA_ProfileSoftwareIdentity, the provider's own software. Read-
-// only: instances come from ServerManager, and no method does anything.
+// Serves VESPERA_ProfileSoftwareIdentity, the provider's own software.
+// Read-only: instances come from ServerManager, and no method does anything.
 class VESPERA_ProfileSoftwareIdentity_Provider
 {
 public:

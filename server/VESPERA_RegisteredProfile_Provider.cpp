@@ -50,6 +50,7 @@ Modify_Instance_Status VESPERA_RegisteredProfile_Provider::modify_instance(const
 
 Invoke_Method_Status VESPERA_RegisteredProfile_Provider::CloseConformantInstances(
     const VESPERA_RegisteredProfile*,
+    const Property<String>&,
     Property<uint32>&)
 {
     return INVOKE_METHOD_UNSUPPORTED;
@@ -57,6 +58,15 @@ Invoke_Method_Status VESPERA_RegisteredProfile_Provider::CloseConformantInstance
 
 Invoke_Method_Status VESPERA_RegisteredProfile_Provider::OpenConformantInstances(
     const VESPERA_RegisteredProfile*,
+    const Property<String>&,
+    const Property<Array<String> >&,
+    const Property<uint32>&,
+    const Property<bool>&,
+    const Property<uint32>&,
+    Property<String>&,
+    Property<bool>&,
+    Property<Array<uint16> >&,
+    Property<Array<String> >&,
     Property<uint32>&)
 {
     return INVOKE_METHOD_UNSUPPORTED;
@@ -64,6 +74,11 @@ Invoke_Method_Status VESPERA_RegisteredProfile_Provider::OpenConformantInstances
 
 Invoke_Method_Status VESPERA_RegisteredProfile_Provider::PullConformantInstances(
     const VESPERA_RegisteredProfile*,
+    Property<String>&,
+    const Property<uint32>&,
+    Property<bool>&,
+    Property<Array<uint16> >&,
+    Property<Array<String> >&,
     Property<uint32>&)
 {
     return INVOKE_METHOD_UNSUPPORTED;

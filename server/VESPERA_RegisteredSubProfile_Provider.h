@@ -35,14 +35,29 @@ public:
 
     Invoke_Method_Status CloseConformantInstances(
         const VESPERA_RegisteredSubProfile* self,
+        const Property<String>& EnumerationContext,
         Property<uint32>& return_value);
 
     Invoke_Method_Status OpenConformantInstances(
         const VESPERA_RegisteredSubProfile* self,
+        const Property<String>& ResultClass,
+        const Property<Array<String> >& IncludedPropertyList,
+        const Property<uint32>& OperationTimeout,
+        const Property<bool>& ContinueOnError,
+        const Property<uint32>& MaxObjectCount,
+        Property<String>& EnumerationContext,
+        Property<bool>& EndOfSequence,
+        Property<Array<uint16> >& InstanceType,
+        Property<Array<String> >& InstanceWithPathList,
         Property<uint32>& return_value);
 
     Invoke_Method_Status PullConformantInstances(
         const VESPERA_RegisteredSubProfile* self,
+        Property<String>& EnumerationContext,
+        const Property<uint32>& MaxObjectCount,
+        Property<bool>& EndOfSequence,
+        Property<Array<uint16> >& InstanceType,
+        Property<Array<String> >& InstanceWithPathList,
         Property<uint32>& return_value);
 };
 
