@@ -123,6 +123,23 @@ class GenError(Exception):
     pass
 
 
+# Names that a feature or parameter can't have, since it becomes a member of
+# a record derived from Instance: Instance's own fields, the static table and
+# the C++ keywords that are also valid MOF identifiers.
+RESERVED = frozenset("""
+    magic refs meta_class __name_space static_meta_class
+    alignas alignof and and_eq asm auto bitand bitor bool break case catch
+    char char16_t char32_t class compl const constexpr const_cast continue
+    decltype default delete do double dynamic_cast else enum explicit export
+    extern false float for friend goto if inline int long mutable namespace
+    new noexcept not not_eq nullptr operator or or_eq private protected public
+    register reinterpret_cast return short signed sizeof static static_assert
+    static_cast struct switch template this thread_local throw true try
+    typedef typeid typename union unsigned using virtual void volatile wchar_t
+    while xor xor_eq
+""".split())
+
+
 # ---------------------------------------------------------------------------
 # The model: classes with their features resolved against their parents.
 # ---------------------------------------------------------------------------
@@ -383,6 +400,10 @@ class Model:
         c.restricted = restr
         index = {f.name.lower(): i for i, f in enumerate(c.features)}
         for f in d.features:
+            names = [f.name] + [p.name for p in f.params]
+            for n in names:
+                if n in RESERVED:
+                    raise GenError('%s: %s can\'t be a member name' % (f.where, n))
             key = f.name.lower()
             i = index.get(key)
             if i is not None and c.locals[i]:

@@ -153,6 +153,8 @@ class ModelTest(unittest.TestCase):
             'class VESPERA_X : CIM_B { string S; string s; };',
             'class VESPERA_X : CIM_Nowhere { };',
             '[Association] class VESPERA_X { string S; };',
+            'class VESPERA_X : CIM_B { string refs; };',
+            'class VESPERA_X : CIM_B { uint32 M(uint8 delete); };',
         ]
         for text in bad:
             with self.assertRaises(gen_schema.GenError, msg=text):
