@@ -319,6 +319,8 @@ class Model:
     def _own_feature(self, c, f, inherited):
         where = f.where
         if f.kind == 'method':
+            if inherited and inherited.kind != 'method':
+                raise GenError('%s: %s overrides a %s' % (where, f.name, inherited.kind))
             set_b, clr_b, restr = _qualifier_bits(f.qualifiers, self.decls, 'method', where)
             flags = F_METHOD | ((inherited.flags & ~inherited.restricted) if inherited else self.method_true)
             flags = (flags | set_b) & ~clr_b
@@ -332,7 +334,6 @@ class Model:
                 seen.add(p.name.lower())
                 ps, pc, _ = _qualifier_bits(p.qualifiers, self.decls, 'parameter', p.where)
                 if p.kind == 'reference':
-                    self.get(p.type, p.where)
                     pflags = (F_REFERENCE | self.param_true | ps) & ~pc
                     ptype = self.get(p.type, p.where).name
                 else:

@@ -154,6 +154,8 @@ class ModelTest(unittest.TestCase):
             'class VESPERA_X : CIM_Nowhere { };',
             '[Association] class VESPERA_X { string S; };',
             'class VESPERA_X : CIM_B { string refs; };',
+            'class VESPERA_X : CIM_B { uint32 Note(); };',
+            'class VESPERA_X : CIM_B { string Reset; };',
             'class VESPERA_X : CIM_B { uint32 M(uint8 delete); };',
         ]
         for text in bad:
