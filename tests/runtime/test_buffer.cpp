@@ -84,7 +84,7 @@ TEST(Buffer, FormatAppendsAndGrows)
     b.append_uint32(7);
     b.append(' ');
     b.append_uint64(18446744073709551615ULL);
-    EXPECT_EQ(std::string(b.c_str() + 5006), "65535 7 18446744073709551615");
+    EXPECT_EQ(std::string(b.data() + 5006, b.size() - 5006), "65535 7 18446744073709551615");
 
     Buffer c(b), d;
     d = c;
