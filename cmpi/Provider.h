@@ -1,0 +1,12 @@
+#ifndef _OLMA_Provider_h
+#define _OLMA_Provider_h
+
+// Everything a provider class needs: instances, its status enums and the
+// handlers it sends instances to. A provider is a plain class with no common
+// base; its dispatch function calls its members by name.
+
+#include "Instance.h"
+#include "Provider_Status.h"
+#include "Provider_Handler.h"
+
+#endif // _OLMA_Provider_h

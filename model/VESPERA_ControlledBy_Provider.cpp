@@ -1,0 +1,71 @@
+#include "VESPERA_ControlledBy_Provider.h"
+#include "log.h"
+
+namespace OLMA
+{
+
+VESPERA_ControlledBy_Provider::VESPERA_ControlledBy_Provider()
+{
+}
+
+VESPERA_ControlledBy_Provider::~VESPERA_ControlledBy_Provider()
+{
+}
+
+Load_Status VESPERA_ControlledBy_Provider::load()
+{
+    return LOAD_OK;
+}
+
+Unload_Status VESPERA_ControlledBy_Provider::unload()
+{
+    return UNLOAD_OK;
+}
+
+Get_Instance_Status VESPERA_ControlledBy_Provider::get_instance(const VESPERA_ControlledBy*, VESPERA_ControlledBy*&)
+{
+    return GET_INSTANCE_UNSUPPORTED;
+}
+
+Enum_Instances_Status VESPERA_ControlledBy_Provider::enum_instances(
+    const VESPERA_ControlledBy*, Enum_Instances_Handler<VESPERA_ControlledBy>*)
+{
+    TLOG(LL_DBG, "Entering: %s", "enum_instances");
+    TLOG(LL_DBG, "Returning: %s", "enum_instances");
+    return ENUM_INSTANCES_OK;
+}
+
+Create_Instance_Status VESPERA_ControlledBy_Provider::create_instance(VESPERA_ControlledBy*)
+{
+    return CREATE_INSTANCE_UNSUPPORTED;
+}
+
+Delete_Instance_Status VESPERA_ControlledBy_Provider::delete_instance(const VESPERA_ControlledBy*)
+{
+    return DELETE_INSTANCE_UNSUPPORTED;
+}
+
+Modify_Instance_Status VESPERA_ControlledBy_Provider::modify_instance(const VESPERA_ControlledBy*, const VESPERA_ControlledBy*)
+{
+    return MODIFY_INSTANCE_UNSUPPORTED;
+}
+
+Enum_Associator_Names_Status VESPERA_ControlledBy_Provider::enum_associator_names(const Instance*,
+    const String&, const String&, const String&, Enum_Associator_Names_Handler<Instance>*)
+{
+    return ENUM_ASSOCIATOR_NAMES_UNSUPPORTED;
+}
+
+Enum_Associators_Status VESPERA_ControlledBy_Provider::enum_associators(const Instance*,
+    const String&, const String&, const String&, Enum_Associators_Handler<Instance>*)
+{
+    return ENUM_ASSOCIATORS_UNSUPPORTED;
+}
+
+Enum_References_Status VESPERA_ControlledBy_Provider::enum_references(const Instance*,
+    const VESPERA_ControlledBy*, const String&, Enum_References_Handler<VESPERA_ControlledBy>*)
+{
+    return ENUM_REFERENCES_UNSUPPORTED;
+}
+
+} // namespace OLMA

@@ -1,0 +1,369 @@
+#!/usr/bin/env python3
+"""Generates the provider glue of the module: for each provider its dispatch
+function, its Registration record and its exported CMPI entries, plus the
+linker version script and the list of exported names.
+
+    tools/gen_providers.py [--schema DIR] [--out-dir DIR] [--check]
+
+The providers, their order and kinds are the tables below; the extrinsic
+methods and their parameters come from the class model that
+tools/gen_schema.py builds (the DMTF MOF under --schema plus the module's
+MOF), so that the dispatch functions and the method records agree. Output is
+deterministic.
+"""
+
+import argparse
+import os
+import sys
+
+HERE = os.path.dirname(os.path.abspath(__file__))
+ROOT = os.path.dirname(HERE)
+sys.path.insert(0, HERE)
+
+import gen_schema  # noqa: E402
+
+# Providers in registration order, with the parent of the class they serve
+# and the kind of that class: 'C' plain, 'A' association, 'N' indication.
+PROVIDERS = [
+    ("VESPERA_ComputerSystem", "CIM_ComputerSystem", "C"),
+    ("VESPERA_PortController", "CIM_PortController", "C"),
+    ("VESPERA_FCPort", "CIM_FCPort", "C"),
+    ("VESPERA_FCPortStatistics", "CIM_FCPortStatistics", "C"),
+    ("VESPERA_AdapterSoftwareIdentity", "CIM_SoftwareIdentity", "C"),
+    ("VESPERA_PhysicalPackage", "CIM_PhysicalPackage", "C"),
+    ("VESPERA_Product", "CIM_Product", "C"),
+    ("VESPERA_SCSIProtocolEndpoint", "CIM_SCSIProtocolEndpoint", "C"),
+    ("VESPERA_ElementStatisticalData", "CIM_ElementStatisticalData", "A"),
+    ("VESPERA_ControlledBy", "CIM_ControlledBy", "A"),
+    ("VESPERA_AdapterElementSoftwareIdentity", "CIM_ElementSoftwareIdentity", "A"),
+    ("VESPERA_Realizes", "CIM_Realizes", "A"),
+    ("VESPERA_ProductPhysicalComponent", "CIM_ProductPhysicalComponent", "A"),
+    ("VESPERA_FCPortSystemDevice", "CIM_SystemDevice", "A"),
+    ("VESPERA_PortControllerSystemDevice", "CIM_SystemDevice", "A"),
+    ("VESPERA_HostedAccessPoint", "CIM_HostedAccessPoint", "A"),
+    ("VESPERA_DeviceSAPImplementation", "CIM_DeviceSAPImplementation", "A"),
+    ("VESPERA_InstalledSoftwareIdentity", "CIM_InstalledSoftwareIdentity", "A"),
+    ("VESPERA_ObjectManager", "CIM_ObjectManager", "C"),
+    ("VESPERA_Namespace", "CIM_Namespace", "C"),
+    ("VESPERA_CIMXMLCommunicationMechanism", "CIM_CIMXMLCommunicationMechanism", "C"),
+    ("VESPERA_CommMechanismForManager", "CIM_CommMechanismForManager", "A"),
+    ("VESPERA_NamespaceInManager", "CIM_NamespaceInManager", "A"),
+    ("VESPERA_ObjectManagerHostedService", "CIM_HostedService", "A"),
+    ("VESPERA_CommMechHostedAccessPoint", "CIM_HostedAccessPoint", "A"),
+    ("VESPERA_RegisteredProfile", "CIM_RegisteredProfile", "C"),
+    ("VESPERA_RegisteredSubProfile", "CIM_RegisteredSubProfile", "C"),
+    ("VESPERA_ProfileSoftwareIdentity", "CIM_SoftwareIdentity", "C"),
+    ("VESPERA_ElementConformsToProfile", "CIM_ElementConformsToProfile", "A"),
+    ("VESPERA_ProfileElementSoftwareIdentity", "CIM_ElementSoftwareIdentity", "A"),
+    ("VESPERA_SubProfileRequiresProfile", "CIM_SubProfileRequiresProfile", "A"),
+    ("VESPERA_LogicalDisk", "CIM_LogicalDisk", "C"),
+    ("VESPERA_StorageExtent", "CIM_StorageExtent", "C"),
+    ("VESPERA_TapeDrive", "CIM_TapeDrive", "C"),
+    ("VESPERA_StorageResourcesSystemDevice", "CIM_SystemDevice", "A"),
+    ("VESPERA_RemoteServiceAccessPoint", "CIM_RemoteServiceAccessPoint", "C"),
+    ("VESPERA_RemoteServiceHostedAccessPoint", "CIM_HostedAccessPoint", "A"),
+    ("VESPERA_HBASoftwareInstallationService", "CIM_SoftwareInstallationService", "C"),
+    ("VESPERA_HBASoftwareInstallationServiceCapabilities", "CIM_SoftwareInstallationServiceCapabilities", "C"),
+    ("VESPERA_HBASoftwareInstallationServiceHostedService", "CIM_HostedService", "A"),
+    ("VESPERA_HBASoftwareInstallationServiceElementCapabilities", "CIM_ElementCapabilities", "A"),
+    ("VESPERA_EthernetPort", "CIM_EthernetPort", "C"),
+    ("VESPERA_EthernetPortSystemDevice", "CIM_SystemDevice", "A"),
+    ("VESPERA_EthernetPortControlledBy", "CIM_ControlledBy", "A"),
+    ("VESPERA_ProductElementComponent", "CIM_ProductElementComponent", "A"),
+    ("VESPERA_AlertIndication", "CIM_AlertIndication", "N"),
+    ("VESPERA_MemoryDiagnosticTest", "CIM_DiagnosticTest", "C"),
+    ("VESPERA_LoopbackDiagnosticTest", "CIM_DiagnosticTest", "C"),
+    ("VESPERA_PCILoopbackDiagnosticTest", "CIM_DiagnosticTest", "C"),
+    ("VESPERA_EthLoopbackDiagnosticTest", "CIM_DiagnosticTest", "C"),
+    ("VESPERA_DiagnosticSoftwareIdentity", "CIM_SoftwareIdentity", "C"),
+    ("VESPERA_ConcreteJob", "CIM_ConcreteJob", "C"),
+    ("VESPERA_DiagnosticServiceRecord", "CIM_DiagnosticServiceRecord", "C"),
+    ("VESPERA_DiagnosticCompletionRecord", "CIM_DiagnosticCompletionRecord", "C"),
+    ("VESPERA_DiagnosticElementSoftwareIdentity", "CIM_ElementSoftwareIdentity", "A"),
+    ("VESPERA_OwningJobElement", "CIM_OwningJobElement", "A"),
+    ("VESPERA_AffectedJobElement", "CIM_AffectedJobElement", "A"),
+    ("VESPERA_AvailableDiagnosticServiceForAdapter", "CIM_AvailableDiagnosticService", "A"),
+    ("VESPERA_AvailableDiagnosticServiceForFCPort", "CIM_AvailableDiagnosticService", "A"),
+    ("VESPERA_AvailableDiagnosticServiceForEthernetPort", "CIM_AvailableDiagnosticService", "A"),
+    ("VESPERA_ServiceRecordAppliesToElement", "CIM_RecordAppliesToElement", "A"),
+    ("VESPERA_CompletionRecordAppliesToElement", "CIM_RecordAppliesToElement", "A"),
+    ("VESPERA_LogicalPortGroup", "CIM_LogicalPortGroup", "C"),
+    ("VESPERA_MemberOfCollection", "CIM_MemberOfCollection", "A"),
+    ("VESPERA_HostedCollection", "CIM_HostedCollection", "A"),
+    ("VESPERA_HostedDependency", "CIM_HostedDependency", "A"),
+    ("VESPERA_PhysicalConnector", "CIM_PhysicalConnector", "C"),
+    ("VESPERA_EthernetPortRealizes", "CIM_Realizes", "A"),
+    ("VESPERA_PhysicalConnectorContainer", "CIM_Container", "A"),
+    ("VESPERA_LANEndpoint", "CIM_LANEndpoint", "C"),
+    ("VESPERA_LANEndpointDeviceSAPImplementation", "CIM_DeviceSAPImplementation", "A"),
+    ("VESPERA_HostedLANEndpoint", "CIM_HostedAccessPoint", "A"),
+    ("VESPERA_AlarmDevice", "CIM_AlarmDevice", "C"),
+    ("VESPERA_AssociatedAlarm", "CIM_AssociatedAlarm", "A"),
+    ("VESPERA_SCSIInitiatorTargetLogicalUnitPath", "CIM_SCSIInitiatorTargetLogicalUnitPath", "A"),
+    ("VESPERA_AgentService", None, "C"),
+]
+
+DEVICE_OPS = ["RequestStateChange", "SetPowerState", "Reset", "EnableDevice",
+              "OnlineDevice", "QuiesceDevice", "SaveProperties", "RestoreProperties"]
+SERVICE_OPS = ["RequestStateChange", "StartService", "StopService",
+               "ChangeAffectedElementsAssignedSequence"]
+DIAG_OPS = SERVICE_OPS + ["RunDiagnostic", "RunDiagnosticService", "RunTest",
+                          "ClearResults", "DiscontinueTest"]
+PROFILE_OPS = ["CloseConformantInstances", "OpenConformantInstances",
+               "PullConformantInstances"]
+
+# Extrinsic methods per class, in the order of the class's features.
+METHODS = {
+    "VESPERA_ComputerSystem": ["RequestStateChange", "SetPowerState"],
+    "VESPERA_PortController": DEVICE_OPS,
+    "VESPERA_FCPort": DEVICE_OPS,
+    "VESPERA_LogicalDisk": DEVICE_OPS,
+    "VESPERA_StorageExtent": DEVICE_OPS,
+    "VESPERA_EthernetPort": DEVICE_OPS,
+    "VESPERA_FCPortStatistics": ["ResetSelectedStats"],
+    "VESPERA_PhysicalPackage": ["IsCompatible"],
+    "VESPERA_SCSIProtocolEndpoint": ["RequestStateChange", "BroadcastReset"],
+    "VESPERA_LANEndpoint": ["RequestStateChange", "BroadcastReset"],
+    "VESPERA_ObjectManager": SERVICE_OPS,
+    "VESPERA_CIMXMLCommunicationMechanism": ["RequestStateChange"],
+    "VESPERA_RemoteServiceAccessPoint": ["RequestStateChange"],
+    "VESPERA_RegisteredProfile": PROFILE_OPS,
+    "VESPERA_RegisteredSubProfile": PROFILE_OPS,
+    "VESPERA_TapeDrive": DEVICE_OPS + ["LockMedia"],
+    "VESPERA_HBASoftwareInstallationService": SERVICE_OPS + [
+        "CheckSoftwareIdentity", "InstallFromSoftwareIdentity",
+        "InstallFromByteStream", "InstallFromURI"],
+    "VESPERA_HBASoftwareInstallationServiceCapabilities": ["CreateGoalSettings"],
+    "VESPERA_MemoryDiagnosticTest": DIAG_OPS,
+    "VESPERA_LoopbackDiagnosticTest": DIAG_OPS,
+    "VESPERA_PCILoopbackDiagnosticTest": DIAG_OPS,
+    "VESPERA_EthLoopbackDiagnosticTest": DIAG_OPS,
+    "VESPERA_ConcreteJob": ["KillJob", "RequestStateChange", "GetError", "GetErrors"],
+    "VESPERA_AlarmDevice": DEVICE_OPS + ["SetAlarmState", "SetAlarmIndicator",
+                                         "SetUrgency"],
+    "VESPERA_AgentService": ["executeMethod"],
+}
+
+# Where each provider class lives.
+SERVER = {"VESPERA_RegisteredProfile", "VESPERA_RegisteredSubProfile",
+          "VESPERA_Namespace", "VESPERA_ObjectManager",
+          "VESPERA_CIMXMLCommunicationMechanism", "VESPERA_ProfileSoftwareIdentity"}
+DIAG = {"VESPERA_MemoryDiagnosticTest", "VESPERA_LoopbackDiagnosticTest",
+        "VESPERA_PCILoopbackDiagnosticTest", "VESPERA_EthLoopbackDiagnosticTest",
+        "VESPERA_DiagnosticSoftwareIdentity", "VESPERA_ConcreteJob",
+        "VESPERA_DiagnosticServiceRecord", "VESPERA_DiagnosticCompletionRecord",
+        "VESPERA_DiagnosticElementSoftwareIdentity", "VESPERA_OwningJobElement",
+        "VESPERA_AffectedJobElement", "VESPERA_AvailableDiagnosticServiceForAdapter",
+        "VESPERA_AvailableDiagnosticServiceForFCPort",
+        "VESPERA_AvailableDiagnosticServiceForEthernetPort",
+        "VESPERA_ServiceRecordAppliesToElement",
+        "VESPERA_CompletionRecordAppliesToElement"}
+UPDATE = {"VESPERA_HBASoftwareInstallationService",
+          "VESPERA_HBASoftwareInstallationServiceCapabilities",
+          "VESPERA_HBASoftwareInstallationServiceHostedService",
+          "VESPERA_HBASoftwareInstallationServiceElementCapabilities"}
+
+
+def home_dir(cls):
+    if cls in SERVER:
+        return "server"
+    if cls in DIAG:
+        return "diag"
+    if cls in UPDATE:
+        return "update"
+    if cls == "VESPERA_AlertIndication":
+        return "indication"
+    if cls == "VESPERA_AgentService":
+        return "rpc"
+    return "model"
+
+
+def slot_type(p):
+    """The C++ type of a parameter's slot in the method record."""
+    return gen_schema.slot_type(p)
+
+
+def is_out(p):
+    return bool(p.flags & gen_schema.F_OUT)
+
+
+def param_decl(p):
+    """The provider member's parameter for p."""
+    t = slot_type(p)
+    if p.kind == "reference" and not p.subscript:
+        base = p.type
+        return ("%s*& %s" % (base, p.member)) if is_out(p) else ("const %s* %s" % (base, p.member))
+    return ("%s& %s" % (t, p.member)) if is_out(p) else ("const %s& %s" % (t, p.member))
+
+
+KIND_FLAGS = {"C": gen_schema.F_CLASS, "A": gen_schema.F_ASSOCIATION,
+              "N": gen_schema.F_INDICATION}
+
+
+def collect(model):
+    out = []
+    for cls, parent, kind in PROVIDERS:
+        c = model.classes[cls.lower()]
+        if not (c.flags & KIND_FLAGS[kind]):
+            raise ValueError("%s is not of kind %s" % (cls, kind))
+        methods = [f for f in c.features if f.kind == "method"]
+        names = [m.name for m in methods]
+        if names != METHODS.get(cls, []):
+            raise ValueError("%s has the methods %s" % (cls, names))
+        out.append(dict(cls=cls, parent=parent, kind=kind, methods=methods))
+    return out
+
+
+def entry_kinds(kind):
+    if kind == "N":
+        return ["Method", "Indication"]
+    if kind == "A":
+        return ["Instance", "Method", "Association"]
+    return ["Instance", "Method"]
+
+
+KIND_TYPES = {"Instance": ("CMPIInstanceMI", "I"), "Method": ("CMPIMethodMI", "M"),
+              "Association": ("CMPIAssociationMI", "A"),
+              "Indication": ("CMPIIndicationMI", "N")}
+
+MARK = "// Generated by tools/gen_providers.py from its provider tables and the class model of tools/gen_schema.py; do not edit.\n"
+
+
+def gen_cpp(provs):
+    w = []
+    a = w.append
+    a(MARK)
+    a("\n#include <strings.h>\n")
+    a('#include "Dispatch.h"\n')
+    a('#include "CMPI_Adapter.h"\n')
+    for p in provs:
+        a('#include "%s_Provider.h"\n' % p["cls"])
+    a("\nnamespace OLMA\n{\n\n")
+    a('static const char _tessel_module_name[] = "vsprprovider_Module";\n\n')
+    prev = "0"
+    for p in provs:
+        cls = p["cls"]
+        prov = cls + "_Provider"
+        if p["methods"]:
+            a("static sint32 _%s_invoke(\n    %s* provider, const %s* self, Instance* method)\n{\n"
+              % (prov, prov, cls))
+            a("    const char* name = __method_name(method);\n")
+            a("    if (!name)\n        return -1;\n")
+            for m in p["methods"]:
+                rec = "%s_%s_method" % (cls, m.name)
+                a("\n    if (strcasecmp(name, \"%s\") == 0)\n    {\n" % m.name)
+                a("        // Only the class's own record has the layout cast to here.\n")
+                a("        if (!__is_record<%s>(method))\n            return -1;\n" % rec)
+                a("        %s* m = (%s*)method;\n" % (rec, rec))
+                args = ", ".join(["self"] + ["m->%s" % q.member for q in m.params])
+                a("        return provider->%s(%s);\n    }\n" % (m.name, args))
+            a("\n    return -1;\n}\n\n")
+        a("extern \"C\" sint32 __tessel_%s_proc(\n    const Registration* registration, int operation,\n"
+          "    void* arg0, void* arg1, void* arg2, void* arg3,\n"
+          "    void* arg4, void* arg5, void* arg6, void* arg7)\n{\n" % prov)
+        if p["methods"]:
+            a("    if (operation == OP_INVOKE_METHOD)\n")
+            a("        return _%s_invoke((%s*)arg0, (const %s*)arg1, (Instance*)arg2);\n\n"
+              % (prov, prov, cls))
+        disp = {"C": "__dispatch_instance", "A": "__dispatch_association",
+                "N": "__dispatch_indication"}[p["kind"]]
+        a("    return %s<%s, %s>(\n        registration, operation, arg0, arg1, arg2, arg3, arg4, arg5, arg6, arg7);\n}\n\n"
+          % (disp, cls, prov))
+        a("static Registration _%s_registration =\n{\n" % prov)
+        a("    _tessel_module_name,\n    \"%s\",\n    __tessel_%s_proc,\n    &%s::static_meta_class,\n    %s,\n};\n\n"
+          % (prov, prov, cls, prev))
+        a("static CMPI_Static_Data _cmpi_static_data%s;\n\n" % prov)
+        prev = "&_%s_registration" % prov
+    a("extern \"C\" CMPI_EXPORT const Registration* tessel_module()\n{\n    return %s;\n}\n\n" % prev)
+    a("} // namespace OLMA\n\nusing namespace OLMA;\n\n")
+    for p in provs:
+        prov = p["cls"] + "_Provider"
+        for kind in entry_kinds(p["kind"]):
+            mi, letter = KIND_TYPES[kind]
+            a("extern \"C\" CMPI_EXPORT %s* %s_Create_%sMI(\n"
+              "    const CMPIBroker* broker, const CMPIContext* context, CMPIStatus*)\n{\n"
+              "    void* mi = 0;\n"
+              "    tessel_cmpi_adapter(&_cmpi_static_data%s, &_%s_registration,\n"
+              "        broker, context, \"%s\", '%s', &mi);\n"
+              "    return (%s*)mi;\n}\n\n"
+              % (mi, prov, kind, prov, prov, prov, letter, mi))
+            a("extern \"C\" CMPI_EXPORT %s* %s_Create_%sMI(\n"
+              "    const CMPIBroker* broker, const CMPIContext* context, CMPIStatus* status)\n{\n"
+              "    return %s_Create_%sMI(broker, context, status);\n}\n\n"
+              % (mi, p["cls"], kind, prov, kind))
+    text = "".join(w)
+    return text.rstrip("\n") + "\n"
+
+
+def export_names(provs):
+    names = []
+    for p in provs:
+        for kind in entry_kinds(p["kind"]):
+            names.append("%s_Provider_Create_%sMI" % (p["cls"], kind))
+            names.append("%s_Create_%sMI" % (p["cls"], kind))
+    names += ["tessel_module", "__tessel_version_2_0_16"]
+    return sorted(names)
+
+
+def gen_exports(provs):
+    return "".join(n + "\n" for n in export_names(provs))
+
+
+def gen_version_script(provs):
+    w = ["/* Generated by tools/gen_providers.py from its provider tables; do not edit.\n"
+         "   Only the CMPI entries, tessel_module and the version word leave the module. */\n",
+         "{\n  global:\n"]
+    for n in export_names(provs):
+        w.append("    %s;\n" % n)
+    w.append("  local:\n    *;\n};\n")
+    return "".join(w)
+
+
+def main():
+    ap = argparse.ArgumentParser()
+    ap.add_argument("--schema", default=gen_schema.DEFAULT_SCHEMA,
+                    help="directory of the DMTF class files (subset.mof)")
+    ap.add_argument("--out-dir", default=os.path.join(ROOT, "cmpi", "generated"))
+    ap.add_argument("--check", action="store_true",
+                    help="fail if a generated file differs from what is on disk")
+    ap.add_argument("--signatures", action="store_true",
+                    help="print the provider members that the dispatch calls")
+    args = ap.parse_args()
+
+    if not os.path.isfile(os.path.join(args.schema, "subset.mof")):
+        print("gen_providers: %s not found" % args.schema, file=sys.stderr)
+        return 77 if args.check else 2
+    provs = collect(gen_schema.load(args.schema))
+    if args.signatures:
+        for p in provs:
+            for m in p["methods"]:
+                decl = ", ".join(["const %s* self" % p["cls"]] + [param_decl(q) for q in m.params])
+                print("%s %s %s(%s)" % (home_dir(p["cls"]), p["cls"], m.name, decl))
+        return 0
+
+    outputs = {
+        "providers.cpp": gen_cpp(provs),
+        "exports.txt": gen_exports(provs),
+        "module.map": gen_version_script(provs),
+    }
+    status = 0
+    os.makedirs(args.out_dir, exist_ok=True)
+    for fn, text in sorted(outputs.items()):
+        path = os.path.join(args.out_dir, fn)
+        old = None
+        if os.path.exists(path):
+            with open(path) as f:
+                old = f.read()
+        if args.check:
+            if old != text:
+                print("out of date: %s" % path, file=sys.stderr)
+                status = 1
+            continue
+        if old != text:
+            with open(path, "w") as f:
+                f.write(text)
+    return status
+
+
+if __name__ == "__main__":
+    sys.exit(main())
