@@ -20,7 +20,8 @@ typedef float real32;
 typedef double real64;
 
 // A CIM char16: a UCS-2 code unit. A class rather than a typedef so that it
-// overloads apart from uint16.
+// overloads apart from uint16. Comparisons go through the conversion to
+// uint16; operators of its own would make "c == 65" ambiguous.
 class char16
 {
 public:
@@ -32,9 +33,6 @@ public:
 private:
     uint16 _code;
 };
-
-inline bool operator==(char16 a, char16 b) { return a.code() == b.code(); }
-inline bool operator!=(char16 a, char16 b) { return a.code() != b.code(); }
 
 static_assert(sizeof(char16) == 2, "char16 must be two bytes");
 static_assert(sizeof(uint64) == 8 && sizeof(sint64) == 8, "64-bit integers");
