@@ -150,21 +150,15 @@ TEST(Array, Equality)
     EXPECT_FALSE(x == y);
 }
 
-TEST(Array, TraitsTables)
+TEST(Array, PointerElementsAreRawWords)
 {
-    EXPECT_EQ(__cim_array_traits[UINT32], __cim_array_traits[SINT32]);
-    EXPECT_EQ(__cim_array_traits[CHAR16], __cim_array_traits[UINT16]);
-    EXPECT_EQ(__cim_array_traits[BOOLEAN], __cim_array_traits[UINT8]);
-    EXPECT_NE(__cim_array_traits[REAL64], __cim_array_traits[UINT64]);
-    EXPECT_EQ(__cim_array_traits[STRING]->construct, _String_construct);
-    EXPECT_EQ(__cim_array_traits[DATETIME]->equal, _Datetime_equal);
-    for (int t = 0; t < NUM_TYPES; t++)
-        EXPECT_EQ(__cim_array_traits[t]->size, (size_t)type_size[t]) << type_name[t];
-
     struct Foo;
     EXPECT_EQ(__Array_Traits_Factory<Foo*>::traits(),
         __Array_Traits_Factory_Raw<void*>::traits());
-    EXPECT_EQ(__Array_Traits_Factory<Foo*>::traits()->size, 8u);
+    Array<Foo*> a;
+    a.append(nullptr);
+    a.append(reinterpret_cast<Foo*>(&a));
+    EXPECT_EQ(a.find(reinterpret_cast<Foo*>(&a)), 1u);
 }
 
 TEST(Array, PtrArrayGrowsByOne)

@@ -305,12 +305,3 @@ TEST(Conversions, LiteralPrinting)
     EXPECT_EQ(testing::internal::GetCapturedStdout(),
         "1, 2, 3|\"x\", \"y\"|0.500000|");
 }
-
-TEST(Conversions, LowerTable)
-{
-    for (int c = 0; c < 256; c++)
-    {
-        int expect = (c >= 'A' && c <= 'Z') ? c + 32 : c;
-        ASSERT_EQ(__lower[c], expect) << c;
-    }
-}
