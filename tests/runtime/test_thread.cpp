@@ -54,7 +54,8 @@ void* exit_early(void* arg)
     Thread::exit((void*)42);
 }
 
-// Pops whatever a test left on this thread's stack.
+// Pops whatever a test left on this thread's stack; declared after the
+// contexts, so that it runs while they still exist.
 struct Stack_Guard
 {
     ~Stack_Guard()
@@ -68,10 +69,10 @@ struct Stack_Guard
 
 TEST(Thread_Context, PushAndPop)
 {
-    Stack_Guard guard;
     Fake_Stats stats;
     Fake_Context a("a", stats);
     Fake_Context b("b", stats);
+    Stack_Guard guard;
 
     Thread_Context::pop();
     EXPECT_EQ(Thread_Context::top(), (Thread_Context*)0);
@@ -96,9 +97,9 @@ TEST(Thread_Context, PushAndPop)
 
 TEST(Thread_Context, StacksArePerThread)
 {
-    Stack_Guard guard;
     Fake_Stats stats;
     Fake_Context a("a", stats);
+    Stack_Guard guard;
     Thread_Context::push(&a);
 
     Thread_Context* other = &a;
@@ -111,9 +112,9 @@ TEST(Thread_Context, StacksArePerThread)
 
 TEST(Thread, InheritsTheHooksContext)
 {
-    Stack_Guard guard;
     Fake_Stats stats;
     Fake_Context parent("parent", stats);
+    Stack_Guard guard;
     Thread_Context::push(&parent);
 
     Seen seen;
@@ -152,10 +153,10 @@ TEST(Thread, NoContextWithoutOne)
 
 TEST(Thread, FailingCreateLeavesCallerIntact)
 {
-    Stack_Guard guard;
     Fake_Stats stats;
     Fake_Context below("below", stats);
     Fake_Context parent("parent", stats);
+    Stack_Guard guard;
     Thread_Context::push(&below);
     Thread_Context::push(&parent);
 
@@ -175,9 +176,9 @@ TEST(Thread, FailingCreateLeavesCallerIntact)
 
 TEST(Thread, ExitRunsTheHookAndReleasesTheContext)
 {
-    Stack_Guard guard;
     Fake_Stats stats;
     Fake_Context parent("parent", stats);
+    Stack_Guard guard;
     Thread_Context::push(&parent);
 
     Seen seen;
