@@ -1,81 +1,63 @@
 // Loads the probe module the way a CIM server loads the provider module and
-// reports, one "key=value" per line, what its start-up left behind.
+// prints, one "key=value" a line, what its start-up left behind.
 //
-//   adapter_probe [--fault entry=kind ...] <module> [bound] [stubs]
+//   adapter_probe [--fault entry=kind] <module>
 //
 // The environment (HOME, LD_LIBRARY_PATH, DTRUJ_HOST) is the caller's. A
 // fault is set in the simulated library before the module loads, so that it
-// meets the module's start-up; the module then finds the library already
-// loaded under its name.
+// meets the start-up; the module then finds the library loaded by its name.
 
 #include <dlfcn.h>
 #include <stdio.h>
 #include <string.h>
 
+#include <string>
+
+template<class F>
+static F find(void* handle, const char* name)
+{
+    return handle ? (F)dlsym(handle, name) : 0;
+}
+
 int main(int argc, char** argv)
 {
     int arg = 1;
 
-    for (; arg + 1 < argc && strcmp(argv[arg], "--fault") == 0; arg += 2)
+    if (argc == 4 && strcmp(argv[1], "--fault") == 0)
     {
-        char entry[256];
-        snprintf(entry, sizeof(entry), "%s", argv[arg + 1]);
-        char* kind = strchr(entry, '=');
+        std::string entry(argv[2]);
+        size_t eq = entry.find('=');
+        void* lib = dlopen("libdtruj.so", RTLD_NOW | RTLD_GLOBAL);
+        auto setFault = find<int (*)(const char*, const char*)>(lib, "dtruj_sim_set_fault");
 
-        if (!kind)
+        if (eq == std::string::npos || !setFault ||
+            setFault(entry.substr(0, eq).c_str(), entry.substr(eq + 1).c_str()) != 0)
             return 2;
 
-        *kind++ = '\0';
-
-        void* lib = dlopen("libdtruj.so", RTLD_NOW | RTLD_GLOBAL);
-        int (*setFault)(const char*, const char*) = lib ?
-            (int (*)(const char*, const char*))dlsym(lib, "dtruj_sim_set_fault") : 0;
-
-        if (!setFault || setFault(entry, kind) != 0)
-        {
-            printf("fault=failed\n");
-            return 1;
-        }
+        arg = 3;
     }
 
-    if (arg >= argc)
-    {
-        fprintf(stderr, "usage: %s [--fault entry=kind ...] <module> [bound] [stubs]\n",
-            argv[0]);
+    if (arg + 1 != argc)
         return 2;
-    }
 
     void* module = dlopen(argv[arg], RTLD_NOW | RTLD_LOCAL);
+    printf("loaded=%d\n", module ? 1 : 0);
 
     if (!module)
-    {
-        printf("loaded=0\nerror=%s\n", dlerror());
         return 1;
-    }
 
-    printf("loaded=1\n");
+    int libraryLoaded = find<int (*)()>(module, "probe_library_loaded")();
+    printf("libraryLoaded=%d\n", libraryLoaded);
+    printf("driverStatus=%d\n", find<int (*)()>(module, "probe_driver_status")());
 
-    int (*status)() = (int (*)())dlsym(module, "probe_driver_status");
-    int (*libLoaded)() = (int (*)())dlsym(module, "probe_library_loaded");
-    printf("driverStatus=%d\n", status());
-    printf("libraryLoaded=%d\n", libLoaded());
+    char unbound[4096];
+    printf("bound=%d\n", find<int (*)(char*, size_t)>(module, "probe_bound_entries")(
+        unbound, sizeof(unbound)));
+    printf("unbound=%s\n", unbound);
 
-    for (int i = arg + 1; i < argc; i++)
-    {
-        if (strcmp(argv[i], "bound") == 0)
-        {
-            int (*bound)(char*, size_t) =
-                (int (*)(char*, size_t))dlsym(module, "probe_bound_entries");
-            char unbound[4096];
-            printf("bound=%d\n", bound(unbound, sizeof(unbound)));
-            printf("unbound=%s\n", unbound);
-        }
-        else if (strcmp(argv[i], "stubs") == 0)
-        {
-            int (*stubs)() = (int (*)())dlsym(module, "probe_stub_answers");
-            printf("stubs=%d\n", stubs());
-        }
-    }
+    // Calling every entry of a real library would set things going in it.
+    if (!libraryLoaded)
+        printf("stubs=%d\n", find<int (*)()>(module, "probe_stub_answers")());
 
     fflush(stdout);
     return 0;

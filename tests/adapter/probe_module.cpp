@@ -3,7 +3,7 @@
 // a few exported questions about the state it ended in.
 
 #include <dlfcn.h>
-#include <string.h>
+#include <stdio.h>
 
 #include <string>
 
@@ -43,11 +43,7 @@ PROBE_API int probe_bound_entries(char* unbound, size_t size)
     VSPR_TRUJ_ENTRIES(PROBE_CHECK)
 #undef PROBE_CHECK
 
-    if (unbound && size)
-    {
-        strncpy(unbound, missing.c_str(), size - 1);
-        unbound[size - 1] = '\0';
-    }
+    snprintf(unbound, size, "%s", missing.c_str());
 
     return bound;
 }
@@ -72,23 +68,17 @@ static bool _answersAsStub(const char* (*fp)())
     return fp() == 0;
 }
 
-static void _noEvent(const char*)
-{
-}
-
-static void _noLog(int, const char*, int, const char*)
-{
-}
-
+// The callback registrations answer nothing: being the stub, and callable
+// with a null callback, is all there is to see.
 static bool _answersAsStub(void (*fp)(EventProcessCB))
 {
-    fp(_noEvent);
+    fp(0);
     return fp == default_evtProcessCBRetVoidFP;
 }
 
 static bool _answersAsStub(void (*fp)(LogMsgCB))
 {
-    fp(_noLog);
+    fp(0);
     return fp == default_log4cxxMsgRetVoidFP;
 }
 
