@@ -23,12 +23,12 @@ struct Datetime_Rep
 class Datetime
 {
 public:
-    static const uint64 USEC = 1ULL;
-    static const uint64 MSEC = 1000ULL;
-    static const uint64 SEC = 1000000ULL;
-    static const uint64 MIN = 60000000ULL;
-    static const uint64 HOUR = 3600000000ULL;
-    static const uint64 DAY = 86400000000ULL;
+    static constexpr uint64 USEC = 1ULL;
+    static constexpr uint64 MSEC = 1000ULL;
+    static constexpr uint64 SEC = 1000000ULL;
+    static constexpr uint64 MIN = 60000000ULL;
+    static constexpr uint64 HOUR = 3600000000ULL;
+    static constexpr uint64 DAY = 86400000000ULL;
 
     // Longest text: the prettified timestamp, 30 characters.
     enum { ASCII_SIZE = 31 };
