@@ -227,14 +227,14 @@
 #define CMIndicationMIStubExtensions(pfx) pfx##EnableIndications, pfx##DisableIndications,
 
 #define CMInstanceMIStub(pfx, pn, broker, hook)                                           \
-  static CMPIInstanceMIFT instMIFT__ = {                                                  \
+  static CMPIInstanceMIFT pn##_instMIFT__ = {                                                  \
       CMPICurrentVersion, CMPICurrentVersion, "instance" #pn, pfx##Cleanup,               \
       pfx##EnumInstanceNames, pfx##EnumInstances, pfx##GetInstance, pfx##CreateInstance,  \
       CMInstanceMIStubChange(pfx), pfx##DeleteInstance, pfx##ExecQuery};                  \
   CMPI_EXTERN_C CMPIInstanceMI* pn##_Create_InstanceMI(const CMPIBroker* brkr,            \
                                                        const CMPIContext* ctx,            \
                                                        CMPIStatus* rc) {                  \
-    static CMPIInstanceMI mi = {NULL, &instMIFT__};                                       \
+    static CMPIInstanceMI mi = {NULL, &pn##_instMIFT__};                                       \
     (void)ctx;                                                                            \
     if (rc) { rc->rc = CMPI_RC_OK; rc->msg = NULL; }                                      \
     broker = brkr;                                                                        \
@@ -243,13 +243,13 @@
   }
 
 #define CMAssociationMIStub(pfx, pn, broker, hook)                                        \
-  static CMPIAssociationMIFT assocMIFT__ = {                                              \
+  static CMPIAssociationMIFT pn##_assocMIFT__ = {                                              \
       CMPICurrentVersion, CMPICurrentVersion, "association" #pn, pfx##AssociationCleanup, \
       pfx##Associators, pfx##AssociatorNames, pfx##References, pfx##ReferenceNames};      \
   CMPI_EXTERN_C CMPIAssociationMI* pn##_Create_AssociationMI(const CMPIBroker* brkr,      \
                                                              const CMPIContext* ctx,      \
                                                              CMPIStatus* rc) {            \
-    static CMPIAssociationMI mi = {NULL, &assocMIFT__};                                   \
+    static CMPIAssociationMI mi = {NULL, &pn##_assocMIFT__};                                   \
     (void)ctx;                                                                            \
     if (rc) { rc->rc = CMPI_RC_OK; rc->msg = NULL; }                                      \
     broker = brkr;                                                                        \
@@ -258,13 +258,13 @@
   }
 
 #define CMMethodMIStub(pfx, pn, broker, hook)                                             \
-  static CMPIMethodMIFT methMIFT__ = {CMPICurrentVersion, CMPICurrentVersion,             \
+  static CMPIMethodMIFT pn##_methMIFT__ = {CMPICurrentVersion, CMPICurrentVersion,             \
                                       "method" #pn, pfx##MethodCleanup,                   \
                                       pfx##InvokeMethod};                                 \
   CMPI_EXTERN_C CMPIMethodMI* pn##_Create_MethodMI(const CMPIBroker* brkr,                \
                                                    const CMPIContext* ctx,                \
                                                    CMPIStatus* rc) {                      \
-    static CMPIMethodMI mi = {NULL, &methMIFT__};                                         \
+    static CMPIMethodMI mi = {NULL, &pn##_methMIFT__};                                         \
     (void)ctx;                                                                            \
     if (rc) { rc->rc = CMPI_RC_OK; rc->msg = NULL; }                                      \
     broker = brkr;                                                                        \
@@ -273,13 +273,13 @@
   }
 
 #define CMPropertyMIStub(pfx, pn, broker, hook)                                           \
-  static CMPIPropertyMIFT propMIFT__ = {CMPICurrentVersion, CMPICurrentVersion,           \
+  static CMPIPropertyMIFT pn##_propMIFT__ = {CMPICurrentVersion, CMPICurrentVersion,           \
                                         "property" #pn, pfx##PropertyCleanup,             \
                                         pfx##SetProperty, pfx##GetProperty};              \
   CMPI_EXTERN_C CMPIPropertyMI* pn##_Create_PropertyMI(const CMPIBroker* brkr,            \
                                                        const CMPIContext* ctx,            \
                                                        CMPIStatus* rc) {                  \
-    static CMPIPropertyMI mi = {NULL, &propMIFT__};                                       \
+    static CMPIPropertyMI mi = {NULL, &pn##_propMIFT__};                                       \
     (void)ctx;                                                                            \
     if (rc) { rc->rc = CMPI_RC_OK; rc->msg = NULL; }                                      \
     broker = brkr;                                                                        \
@@ -288,14 +288,14 @@
   }
 
 #define CMIndicationMIStub(pfx, pn, broker, hook)                                         \
-  static CMPIIndicationMIFT indMIFT__ = {                                                 \
+  static CMPIIndicationMIFT pn##_indMIFT__ = {                                                 \
       CMPICurrentVersion, CMPICurrentVersion, "Indication" #pn, pfx##IndicationCleanup,   \
       pfx##AuthorizeFilter, pfx##MustPoll, pfx##ActivateFilter, pfx##DeActivateFilter,    \
       CMIndicationMIStubExtensions(pfx)};                                                 \
   CMPI_EXTERN_C CMPIIndicationMI* pn##_Create_IndicationMI(const CMPIBroker* brkr,        \
                                                            const CMPIContext* ctx,        \
                                                            CMPIStatus* rc) {              \
-    static CMPIIndicationMI mi = {NULL, &indMIFT__};                                      \
+    static CMPIIndicationMI mi = {NULL, &pn##_indMIFT__};                                      \
     (void)ctx;                                                                            \
     if (rc) { rc->rc = CMPI_RC_OK; rc->msg = NULL; }                                      \
     broker = brkr;                                                                        \
