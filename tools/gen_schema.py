@@ -433,8 +433,7 @@ class Model:
 def _apply_additions(decl_by_name):
     for cls, after, text in ADDITIONS:
         d = decl_by_name[cls.lower()]
-        p = mof._Parser(mof.tokenize(text, 'mof_additions(%s)' % cls))
-        feat = p.feature()
+        feat = mof.parse_feature(text, 'mof_additions(%s)' % cls)
         if any(f.name.lower() == feat.name.lower() for f in d.features):
             raise GenError('%s already has %s' % (cls, feat.name))
         pos = len(d.features)
@@ -447,10 +446,7 @@ def load(schema_dir):
     decls, cim = mof.parse_file(os.path.join(schema_dir, 'subset.mof'))
     by_name = {d.name.lower(): d for d in cim}
 
-    itl = mof._Parser(mof.tokenize(ITL_PATH_MOF, 'gen_schema.py'))
-    itl_quals = itl.qualifier_list()
-    itl.expect('class')
-    itl_decl = itl.class_decl(itl_quals, 'gen_schema.py')
+    itl_decl = mof.parse_text(ITL_PATH_MOF, 'gen_schema.py')[1][0]
     cim.append(itl_decl)
     by_name[itl_decl.name.lower()] = itl_decl
     for f in by_name['cim_scsiinitiatortargetlogicalunitpath'].features:

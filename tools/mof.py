@@ -167,7 +167,7 @@ class Literal:
         self.text = text
 
 
-class _Parser:
+class Parser:
     def __init__(self, tokens):
         self.tokens = tokens
         self.i = 0
@@ -383,13 +383,19 @@ def parse_file(path, qualifier_decls=None, classes=None):
     Returns (qualifier_decls, classes): a dict by lower-case name and a list
     of ClassDecl in the order of the text.
     """
+    with open(path, encoding='utf-8') as f:
+        text = f.read()
+    return parse_text(text, path, qualifier_decls, classes)
+
+
+def parse_text(text, path, qualifier_decls=None, classes=None):
+    """As parse_file, for text that stands in a file named path (includes
+    are relative to its directory)."""
     if qualifier_decls is None:
         qualifier_decls = {}
     if classes is None:
         classes = []
-    with open(path, encoding='utf-8') as f:
-        text = f.read()
-    p = _Parser(tokenize(text, path))
+    p = Parser(tokenize(text, path))
     while p.peek().kind != 'eof':
         t = p.peek()
         if t.kind == 'pragma':
@@ -413,3 +419,12 @@ def parse_file(path, qualifier_decls=None, classes=None):
             continue
         p.error('expected a qualifier or class declaration')
     return qualifier_decls, classes
+
+
+def parse_feature(text, path):
+    """Parses one feature declaration (property, reference or method)."""
+    p = Parser(tokenize(text, path))
+    f = p.feature()
+    if p.peek().kind != 'eof':
+        p.error('expected the end of the feature')
+    return f

@@ -30,11 +30,7 @@ Qualifier EmbeddedInstance : string = null, Scope(property, method, parameter);
 
 
 def model(text, module=()):
-    with tempfile.TemporaryDirectory() as d:
-        path = os.path.join(d, 'x.mof')
-        with open(path, 'w') as f:
-            f.write(QUALIFIERS + text)
-        decls, classes = mof.parse_file(path)
+    decls, classes = mof.parse_text(QUALIFIERS + text, 'x.mof')
     return gen_schema.Model(decls, classes, set(module))
 
 
@@ -60,7 +56,7 @@ class CIM_B : CIM_A { uint8 Extra; };
 
 class ReaderTest(unittest.TestCase):
     def parse(self, text):
-        p = mof._Parser(mof.tokenize(text, 't'))
+        p = mof.Parser(mof.tokenize(text, 't'))
         return p.literal()
 
     def test_literals(self):
@@ -76,7 +72,7 @@ class ReaderTest(unittest.TestCase):
 
     def test_errors_name_the_place(self):
         with self.assertRaisesRegex(mof.MofError, r't:2: .*literal'):
-            mof._Parser(mof.tokenize('\n;', 't')).literal()
+            mof.Parser(mof.tokenize('\n;', 't')).literal()
         with self.assertRaisesRegex(mof.MofError, 'unknown escape'):
             mof.tokenize(r'"\q"', 't')
 
