@@ -170,14 +170,10 @@ TEST(Instance, RefSemantics)
         EXPECT_EQ(d->refs, 1u);
         Ref<Test_Device> b;
         b = a;
-        EXPECT_EQ(d->refs, 2u);
         b = b;
-        EXPECT_EQ(d->refs, 2u);
         Ref<Instance> c(a);
         EXPECT_EQ(d->refs, 3u);
-        Test_Device* x = b.steal();
-        EXPECT_EQ(d->refs, 3u);
-        unref(x);
+        unref(b.steal());
         EXPECT_EQ(d->refs, 2u);
     }
 
