@@ -4,8 +4,11 @@
 
 #include <gtest/gtest.h>
 #include <strings.h>
+#include <algorithm>
 #include <cctype>
+#include <cstring>
 #include <set>
+#include <sstream>
 #include <string>
 #include <vector>
 #include "repository.h"
@@ -616,4 +619,56 @@ TEST(Catalogue, ModuleClassesMarkWhatTheyRedeclare)
     i = find_feature_index(port, find_feature(port, "ActiveCOS"));
     ASSERT_GE(i, 0);
     EXPECT_EQ(0, port->locals[i]);
+}
+
+TEST(Catalogue, ModuleClassesDeclareWhatTheirProvidersFill)
+{
+    struct Filled { const char* cls; const char* props; };
+    static const Filled table[] =
+    {
+        { "VESPERA_FCPort", "CreationClassName SystemCreationClassName SystemName DeviceID "
+          "PermanentAddress ElementName Name Caption OperationalStatus UsageRestriction PortType "
+          "Speed MaxSpeed LinkTechnology SupportedMaximumTransmissionUnit PortNumber EnabledState "
+          "EnabledDefault" },
+        { "VESPERA_PortController", "CreationClassName SystemCreationClassName SystemName DeviceID "
+          "Name ElementName Caption Description OperationalStatus StatusDescriptions EnabledState "
+          "ControllerType OtherControllerType" },
+        { "VESPERA_AlarmDevice", "CreationClassName SystemCreationClassName SystemName Description "
+          "DeviceID ElementName Caption VisibleAlarm Urgency AlarmState" },
+        { "VESPERA_StorageExtent", "CreationClassName SystemCreationClassName SystemName ElementName "
+          "DeviceID OtherIdentifyingInfo IdentifyingDescriptions OperationalStatus Name NameFormat "
+          "NameNamespace" },
+        { "VESPERA_ConcreteJob", "InstanceID Name JobState StartTime ElapsedTime PercentComplete" },
+        { "VESPERA_DiagnosticCompletionRecord", "Caption ElementName Description InstanceID "
+          "CreationTimeStamp RecordData ServiceName ManagedElementName RecordType RecordFormat "
+          "CompletionState" },
+        { "VESPERA_PCILoopbackDiagnosticTest", "Name ElementName SystemName CreationClassName "
+          "SystemCreationClassName Characteristics OtherCharacteristicDescription" },
+        { "VESPERA_RegisteredSubProfile", "InstanceID RegisteredName Caption ElementName "
+          "RegisteredOrganization AdvertiseTypes RegisteredVersion Description" },
+        { "VESPERA_Namespace", "SystemCreationClassName SystemName ObjectManagerCreationClassName "
+          "ObjectManagerName CreationClassName Name ClassInfo ClassType ClassTypeVersion" },
+        { "VESPERA_AlertIndication", "AlertingElementFormat SystemCreationClassName SystemName "
+          "ProviderName EventTime IndicationTime OwningEntity AlertType ProbableCause "
+          "IndicationIdentifier EventID PerceivedSeverity Message AlertingManagedElement "
+          "OtherAlertType Category MessageArguments" },
+        { "VESPERA_HBASoftwareInstallationServiceCapabilities", "InstanceID SupportedInstallOptions "
+          "SupportedURISchemes SupportedSynchronousActions" },
+        { "VESPERA_ProductElementComponent", "GroupComponent PartComponent" },
+        { "VESPERA_SCSIInitiatorTargetLogicalUnitPath", "Initiator Target LogicalUnit" },
+    };
+    for (const Filled& f : table)
+    {
+        const Meta_Class* mc = must_find(f.cls);
+        ASSERT_TRUE(mc);
+        std::istringstream names(f.props);
+        std::string name;
+        while (names >> name)
+        {
+            const Meta_Feature* mf = find_feature(mc, name.c_str(), FLAG_PROPERTY | FLAG_REFERENCE);
+            ssize_t i = mf ? find_feature_index(mc, mf) : -1;
+            ASSERT_GE(i, 0) << f.cls << "." << name;
+            EXPECT_EQ(1, mc->locals[i]) << f.cls << "." << name;
+        }
+    }
 }
