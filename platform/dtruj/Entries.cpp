@@ -401,18 +401,23 @@ bool wwnTaken(State& s, const std::string& w)
 
 // ---------------------------------------------------------------- library
 
-DTRUJ_API const char* get_agt_version()
+// The version is fixed for the life of the process: the module keeps the
+// pointer. DTRUJ_VERSION lets a test play an older library.
+static const char* agentVersion()
 {
-    Json::Value dummy;
-    if (applyFault("get_agt_version", dummy))
-        return nullptr;
-    // The version is fixed for the life of the process: the module keeps the
-    // pointer.
     static const std::string version = [] {
         const char* v = getenv("DTRUJ_VERSION");
         return std::string(v && *v ? v : "3.2.1");
     }();
     return version.c_str();
+}
+
+DTRUJ_API const char* get_agt_version()
+{
+    Json::Value dummy;
+    if (applyFault("get_agt_version", dummy))
+        return nullptr;
+    return agentVersion();
 }
 
 DTRUJ_API void registerLogMsgCb(LogMsgCB cb)
@@ -522,7 +527,7 @@ JSON_ENTRY(getHost)
         r["hostName"] = name;
     }
     r["numOfAdapters"] = Json::UInt(s.host["adapters"].size());
-    r["libraryVersion"] = get_agt_version() ? get_agt_version() : "";
+    r["libraryVersion"] = agentVersion();
     return r;
 }
 
