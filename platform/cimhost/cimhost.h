@@ -214,6 +214,15 @@ public:
     Result cm(const Object_Path& path, const std::string& method,
               const std::vector<Property>& in);
 
+    // Intrinsic writes and queries, through the instance MI of the class.
+    // ci gives the new instance's path in paths[0] (the request's path if
+    // the provider returned none). `inst.class_name` defaults to the path's.
+    Result ci(const Object_Path& path, const Instance& inst);
+    Result mi(const Object_Path& path, const Instance& inst,
+              const std::vector<std::string>* props = nullptr);
+    Result di(const Object_Path& path);
+    Result eq(const Object_Path& cls, const std::string& query, const std::string& lang = "WQL");
+
     // Indications. subscribe() runs authorizeFilter, mustPoll, activateFilter
     // (and enableIndications for a provider's first filter) on every
     // indication provider of the class; `id` receives a handle for

@@ -198,6 +198,8 @@ public:
     CMPIrc do_modify(Object_Path path, const Instance& inst, const char** props,
                      std::string& msg);
     CMPIrc do_delete(Object_Path path, std::string& msg);
+    CMPIrc do_query(Object_Path cls, const std::string& query, const std::string& lang,
+                    std::vector<Value>& out, std::string& msg);
     CMPIrc do_assoc(Assoc_Op op, Object_Path path, const std::string& assoc_class,
                     const std::string& result_class, const std::string& role,
                     const std::string& result_role, const char** props, std::vector<Value>& out,
@@ -1363,6 +1365,28 @@ CMPIrc Host_Impl::do_delete(Object_Path path, std::string& msg)
     return st.rc;
 }
 
+CMPIrc Host_Impl::do_query(Object_Path cls, const std::string& query, const std::string& lang,
+                           std::vector<Value>& out, std::string& msg)
+{
+    CMPIrc rc = check_ns(cls.name_space, msg);
+    if (rc != CMPI_RC_OK)
+        return rc;
+    std::vector<const Registration_Entry*> rs =
+        find_regs(cls.name_space, cls.class_name, MI_INSTANCE, false, rc, msg);
+    if (rc != CMPI_RC_OK || rs.empty())
+        return rc != CMPI_RC_OK ? rc : CMPI_RC_ERR_NOT_SUPPORTED;
+    CMPIInstanceMI* mi = static_cast<CMPIInstanceMI*>(
+        mi_for(rs[0]->provider, MI_INSTANCE, cls.name_space, rc, msg));
+    if (!mi)
+        return rc;
+    Collector c;
+    CMPIStatus st = mi->ft->execQuery(mi, context(cls.name_space), new_result(&c), new_path(cls),
+                                      query.c_str(), lang.c_str());
+    msg = status_text(st);
+    fill_from(out, c);
+    return st.rc;
+}
+
 CMPIrc Host_Impl::do_assoc(Assoc_Op op, Object_Path path, const std::string& assoc_class,
                            const std::string& result_class, const std::string& role,
                            const std::string& result_role, const char** props,
@@ -1795,6 +1819,67 @@ Result Host::cm(const Object_Path& path, const std::string& method, const std::v
         Op_Scope scope;
         r.rc = impl->do_invoke(path, method, in, r.return_value, r.out, r.message);
     }
+    return r;
+}
+
+Result Host::ci(const Object_Path& path, const Instance& inst)
+{
+    if (!impl->ok)
+        return not_loaded(impl);
+    Result r;
+    Instance i = inst;
+    if (i.class_name.empty())
+        i.class_name = path.class_name;
+    if (i.path.class_name.empty())
+        i.path = path;
+    Object_Path made;
+    {
+        Op_Scope scope;
+        r.rc = impl->do_create(path, i, made, r.message);
+    }
+    if (r.rc == CMPI_RC_OK)
+        r.paths.push_back(made);
+    return r;
+}
+
+Result Host::mi(const Object_Path& path, const Instance& inst,
+                const std::vector<std::string>* props)
+{
+    if (!impl->ok)
+        return not_loaded(impl);
+    Result r;
+    Instance i = inst;
+    if (i.class_name.empty())
+        i.class_name = path.class_name;
+    if (i.path.class_name.empty())
+        i.path = path;
+    Op_Scope scope;
+    Prop_List pl;
+    r.rc = impl->do_modify(path, i, pl.get(props), r.message);
+    return r;
+}
+
+Result Host::di(const Object_Path& path)
+{
+    if (!impl->ok)
+        return not_loaded(impl);
+    Result r;
+    Op_Scope scope;
+    r.rc = impl->do_delete(path, r.message);
+    return r;
+}
+
+Result Host::eq(const Object_Path& cls, const std::string& query, const std::string& lang)
+{
+    if (!impl->ok)
+        return not_loaded(impl);
+    Result r;
+    std::vector<Value> items;
+    {
+        Op_Scope scope;
+        r.rc = impl->do_query(cls, query, lang, items, r.message);
+    }
+    split(items, r);
     return r;
 }
 

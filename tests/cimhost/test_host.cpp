@@ -150,6 +150,37 @@ TEST_F(HostTest, GetInstanceAndPropertyFilter)
     EXPECT_EQ(CMPI_uint64, r.instances[0].path.key("Id")->type);
 }
 
+TEST_F(HostTest, WritesAndQueriesReachTheirOwnSlots)
+{
+    Object_Path cls = path_of("root/test:Test_Widget");
+    Instance w;
+    w.properties.push_back({"Name", Value::of_string("new")});
+    Result r = host->ci(cls, w);
+    ASSERT_TRUE(r.ok()) << rc_name(r.rc);
+    ASSERT_EQ(1u, r.paths.size());
+    EXPECT_EQ("root/test:Test_Widget.Name=\"new\"", r.paths[0].to_string());
+    w.properties[0].value = Value::of_string("a");
+    EXPECT_EQ(CMPI_RC_ERR_ALREADY_EXISTS, host->ci(cls, w).rc);
+
+    Object_Path a = path_of("root/test:Test_Widget.Name=\"a\"");
+    Instance m;
+    m.properties.push_back({"Size", Value::of_uint(CMPI_uint16, 9)});
+    std::vector<std::string> props {"Size"};
+    EXPECT_EQ(CMPI_RC_OK, host->mi(a, m, &props).rc);
+    EXPECT_EQ(CMPI_RC_ERR_INVALID_PARAMETER, host->mi(a, m).rc);
+    EXPECT_EQ(CMPI_RC_ERR_NOT_FOUND, host->mi(path_of("root/test:Test_Widget.Name=\"q\""), m, &props).rc);
+
+    EXPECT_EQ(CMPI_RC_OK, host->di(a).rc);
+    EXPECT_EQ(CMPI_RC_ERR_NOT_FOUND, host->di(path_of("root/test:Test_Widget.Name=\"q\"")).rc);
+    EXPECT_EQ(CMPI_RC_ERR_NOT_SUPPORTED, host->di(path_of("root/test:Test_Gadget.Id=1")).rc);
+
+    r = host->eq(cls, "SELECT * FROM Test_Widget");
+    ASSERT_TRUE(r.ok());
+    EXPECT_EQ(3u, r.instances.size());
+    EXPECT_EQ(CMPI_RC_ERR_QUERY_LANGUAGE_NOT_SUPPORTED, host->eq(cls, "x", "CQL").rc);
+    EXPECT_EQ(0u, host->live_objects());
+}
+
 TEST_F(HostTest, RoutingByClassHierarchyAndNamespace)
 {
     // No provider serves Test_Base; its subclasses' providers answer.

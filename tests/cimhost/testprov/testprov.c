@@ -193,25 +193,34 @@ static CMPIStatus Widget_CreateInstance(CMPIInstanceMI* mi, const CMPIContext* c
                                         const CMPIResult* rslt, const CMPIObjectPath* op,
                                         const CMPIInstance* inst)
 {
+    CMPIData name = CMGetProperty(inst, "Name", NULL);
+    size_t i;
     (void)mi;
     (void)ctx;
-    (void)rslt;
-    (void)op;
-    (void)inst;
-    CMReturn(CMPI_RC_ERR_NOT_SUPPORTED);
+    if (name.type != CMPI_string || (name.state & CMPI_nullValue))
+        CMReturn(CMPI_RC_ERR_INVALID_PARAMETER);
+    for (i = 0; i < N(widgets); i++)
+        if (strcmp(widgets[i].name, CMGetCharsPtr(name.value.string, NULL)) == 0)
+            CMReturn(CMPI_RC_ERR_ALREADY_EXISTS);
+    CMReturnObjectPath(rslt, widget_path(ns_of(op), CMGetCharsPtr(name.value.string, NULL)));
+    CMReturnDone(rslt);
+    CMReturn(CMPI_RC_OK);
 }
 
 static CMPIStatus Widget_ModifyInstance(CMPIInstanceMI* mi, const CMPIContext* ctx,
                                         const CMPIResult* rslt, const CMPIObjectPath* op,
                                         const CMPIInstance* inst, const char** properties)
 {
+    CMPIData size = CMGetProperty(inst, "Size", NULL);
     (void)mi;
     (void)ctx;
     (void)rslt;
-    (void)op;
-    (void)inst;
-    (void)properties;
-    CMReturn(CMPI_RC_ERR_NOT_SUPPORTED);
+    if (!find_widget(op))
+        CMReturn(CMPI_RC_ERR_NOT_FOUND);
+    if (size.type != CMPI_uint16 || !properties || !properties[0] ||
+        strcasecmp(properties[0], "Size") != 0)
+        CMReturn(CMPI_RC_ERR_INVALID_PARAMETER);
+    CMReturn(CMPI_RC_OK);
 }
 
 static CMPIStatus Widget_DeleteInstance(CMPIInstanceMI* mi, const CMPIContext* ctx,
@@ -220,21 +229,53 @@ static CMPIStatus Widget_DeleteInstance(CMPIInstanceMI* mi, const CMPIContext* c
     (void)mi;
     (void)ctx;
     (void)rslt;
-    (void)op;
-    CMReturn(CMPI_RC_ERR_NOT_SUPPORTED);
+    CMReturn(find_widget(op) ? CMPI_RC_OK : CMPI_RC_ERR_NOT_FOUND);
 }
 
 static CMPIStatus Widget_ExecQuery(CMPIInstanceMI* mi, const CMPIContext* ctx,
                                    const CMPIResult* rslt, const CMPIObjectPath* op,
                                    const char* query, const char* lang)
 {
+    (void)query;
+    if (strcasecmp(lang, "WQL") != 0)
+        CMReturn(CMPI_RC_ERR_QUERY_LANGUAGE_NOT_SUPPORTED);
+    return Widget_EnumInstances(mi, ctx, rslt, op, NULL);
+}
+
+/* What the other classes don't do. */
+static CMPIStatus None_CreateInstance(CMPIInstanceMI* mi, const CMPIContext* ctx,
+                                      const CMPIResult* rslt, const CMPIObjectPath* op,
+                                      const CMPIInstance* inst)
+{
     (void)mi;
     (void)ctx;
     (void)rslt;
     (void)op;
+    (void)inst;
+    CMReturn(CMPI_RC_ERR_NOT_SUPPORTED);
+}
+
+static CMPIStatus None_ModifyInstance(CMPIInstanceMI* mi, const CMPIContext* ctx,
+                                      const CMPIResult* rslt, const CMPIObjectPath* op,
+                                      const CMPIInstance* inst, const char** properties)
+{
+    (void)properties;
+    return None_CreateInstance(mi, ctx, rslt, op, inst);
+}
+
+static CMPIStatus None_DeleteInstance(CMPIInstanceMI* mi, const CMPIContext* ctx,
+                                      const CMPIResult* rslt, const CMPIObjectPath* op)
+{
+    return None_CreateInstance(mi, ctx, rslt, op, NULL);
+}
+
+static CMPIStatus None_ExecQuery(CMPIInstanceMI* mi, const CMPIContext* ctx,
+                                 const CMPIResult* rslt, const CMPIObjectPath* op,
+                                 const char* query, const char* lang)
+{
     (void)query;
     (void)lang;
-    CMReturn(CMPI_RC_ERR_NOT_SUPPORTED);
+    return None_CreateInstance(mi, ctx, rslt, op, NULL);
 }
 
 CMInstanceMIStub(Widget_, Test_Widget_Provider, broker, COUNT_CREATE)
@@ -485,10 +526,10 @@ static CMPIStatus Gadget_GetInstance(CMPIInstanceMI* mi, const CMPIContext* ctx,
     CMReturn(CMPI_RC_ERR_NOT_FOUND);
 }
 
-#define Gadget_CreateInstance Widget_CreateInstance
-#define Gadget_ModifyInstance Widget_ModifyInstance
-#define Gadget_DeleteInstance Widget_DeleteInstance
-#define Gadget_ExecQuery Widget_ExecQuery
+#define Gadget_CreateInstance None_CreateInstance
+#define Gadget_ModifyInstance None_ModifyInstance
+#define Gadget_DeleteInstance None_DeleteInstance
+#define Gadget_ExecQuery None_ExecQuery
 
 CMInstanceMIStub(Gadget_, Test_Gadget_Provider, broker, COUNT_CREATE)
 
@@ -596,10 +637,10 @@ static CMPIStatus Assoc_GetInstance(CMPIInstanceMI* mi, const CMPIContext* ctx,
     CMReturn(CMPI_RC_ERR_NOT_SUPPORTED);
 }
 
-#define Assoc_CreateInstance Widget_CreateInstance
-#define Assoc_ModifyInstance Widget_ModifyInstance
-#define Assoc_DeleteInstance Widget_DeleteInstance
-#define Assoc_ExecQuery Widget_ExecQuery
+#define Assoc_CreateInstance None_CreateInstance
+#define Assoc_ModifyInstance None_ModifyInstance
+#define Assoc_DeleteInstance None_DeleteInstance
+#define Assoc_ExecQuery None_ExecQuery
 
 CMInstanceMIStub(Assoc_, Test_WidgetGadget_Provider, broker, COUNT_CREATE)
 
