@@ -1,11 +1,22 @@
 #include "Instance.h"
 #include <cmath>
+#include <cstddef>
 #include <cstring>
 #include <new>
 #include "log.h"
 
 namespace OLMA
 {
+
+// The generated tables rely on these positions.
+static_assert(offsetof(Instance, refs) == 4 && offsetof(Instance, meta_class) == 8 &&
+        offsetof(Instance, __name_space) == 16,
+    "Instance layout");
+static_assert(offsetof(Property<boolean>, null) == 1 && offsetof(Property<char16>, null) == 2 &&
+        offsetof(Property<real32>, null) == 4 && offsetof(Property<sint64>, null) == 8 &&
+        offsetof(Property<String>, null) == 8 && offsetof(Property<Datetime>, null) == 8 &&
+        offsetof(Property<Array<uint8>>, null) == 8,
+    "a property's null byte follows its value");
 
 const Meta_Class Instance::static_meta_class =
 {
