@@ -95,38 +95,61 @@ TEST_F(Interop, AdapterLibraryIsAsTheRunExpects)
         dlclose(lib);
 }
 
-TEST_F(Interop, RegisteredProfiles)
+// One line per instance of a profile class, with the columns of its table:
+// name, element name, organization, version, description.
+static std::vector<std::string> profileRows(const ch::Result& r)
 {
-    ch::Result r = served("VESPERA_RegisteredProfile");
-    EXPECT_EQ(column(r, "InstanceID"), (std::vector<std::string>{
-        "SMI-S", "FC HBA", "Server", "Host Discovered Resources", "Storage HBA" }));
-    EXPECT_EQ(column(r, "ElementName"), (std::vector<std::string>{
-        "SMI-S", "FC HBA Profile", "Server Profile", "Host Discovered Resources Profile",
-        "Storage HBA Profile" }));
-    EXPECT_EQ(column(r, "RegisteredVersion"), (std::vector<std::string>{
-        "1.2.0", "1.2.0", "1.2.0", "1.2.0", "1.3.0" }));
+    std::vector<std::string> rows;
     for (const ch::Instance& i : r.instances)
     {
-        EXPECT_EQ(i.class_name, "VESPERA_RegisteredProfile");
-        EXPECT_EQ(i.get_text("RegisteredOrganization"), "11");
-        EXPECT_EQ(i.get_text("AdvertiseTypes"), "{3}");
+        // Both pairs of properties carry the same text.
+        EXPECT_EQ(i.get_text("RegisteredName"), i.get_text("InstanceID"));
         EXPECT_EQ(i.get_text("Caption"), i.get_text("ElementName"));
+        EXPECT_EQ(i.get_text("AdvertiseTypes"), "{3}");
+        rows.push_back(i.get_text("InstanceID") + "|" + i.get_text("ElementName") + "|" +
+            i.get_text("RegisteredOrganization") + "|" + i.get_text("RegisteredVersion") + "|" +
+            i.get_text("Description"));
     }
+    return rows;
+}
+
+TEST_F(Interop, RegisteredProfiles)
+{
+    EXPECT_EQ(profileRows(served("VESPERA_RegisteredProfile")), (std::vector<std::string>{
+        "SMI-S|SMI-S|11|1.2.0|This instance models the SMI-S standard as such",
+        "FC HBA|FC HBA Profile|11|1.2.0|The FC HBA Profile models the HBA device",
+        "Server|Server Profile|11|1.2.0|The Server Profile models the CIM Server",
+        "Host Discovered Resources|Host Discovered Resources Profile|11|1.2.0|"
+            "The HDR profile models the discovered storage resources",
+        "Storage HBA|Storage HBA Profile|11|1.3.0|"
+            "The Storage HBA Profile models the manageable elements of an HBA",
+    }));
 }
 
 TEST_F(Interop, RegisteredSubProfiles)
 {
-    ch::Result r = served("VESPERA_RegisteredSubProfile");
-    EXPECT_EQ(column(r, "InstanceID"), (std::vector<std::string>{
-        "FC Initiator Ports", "Profile Registration", "Access Points", "Software Update",
-        "Software Inventory", "Physical Asset", "Ethernet Port", "Diagnostics Profile",
-        "Host LAN Network Port", "FCoE Initiator Ports" }));
-    EXPECT_EQ(column(r, "RegisteredOrganization"), (std::vector<std::string>{
-        "11", "11", "11", "2", "2", "2", "2", "2", "2", "11" }));
-    EXPECT_EQ(column(r, "RegisteredVersion"), (std::vector<std::string>{
-        "1.2.0", "1.0.0", "1.2.0", "1.0.0", "1.0.0", "1.0.2", "1.0.0", "2.0.0", "1.0.0", "1.0.0" }));
-    ASSERT_EQ(r.instances.size(), 10u);
-    EXPECT_EQ(r.instances[7].get_text("ElementName"), "Diagnostics Profile");
+    EXPECT_EQ(profileRows(served("VESPERA_RegisteredSubProfile")), (std::vector<std::string>{
+        "FC Initiator Ports|FC Initiator Ports subprofile|11|1.2.0|"
+            "The FC Initiator Ports subprofile models the ports present in the HBA device",
+        "Profile Registration|Profile Registration Profile|11|1.0.0|"
+            "The Profile Registration Profile models the profiles registered in the object manager.",
+        "Access Points|Access Points subprofile|11|1.2.0|"
+            "This models the management service(s) points available to the user.",
+        "Software Update|Software Update profile|2|1.0.0|"
+            "This models the software installation service available to the user.",
+        "Software Inventory|Software Inventory profile|2|1.0.0|"
+            "This models the softwares installed and available for installation on the system.",
+        "Physical Asset|Physical Asset profile|2|1.0.2|"
+            "This models the physical aspects of the adapter hardware.",
+        "Ethernet Port|Ethernet Port profile|2|1.0.0|"
+            "This models the ethernet characteristics of the port present in the adapter.",
+        "Diagnostics Profile|Diagnostics Profile|2|2.0.0|"
+            "This models the diagnostic services available for the adapters and its ports.",
+        "Host LAN Network Port|Host LAN Network Port Profile|2|1.0.0|"
+            "This models the network interfaces associated with the network ports",
+        "FCoE Initiator Ports|FCoE Initiator Ports Profile|11|1.0.0|"
+            "This models the FCoE functionality of CNAs",
+    }));
 }
 
 TEST_F(Interop, OneProfileByItsKey)
@@ -155,7 +178,11 @@ TEST_F(Interop, CommunicationMechanismAndIdentity)
     EXPECT_EQ(c.get_text("FunctionalProfilesSupported"), "{2, 3, 4, 5, 6, 8, 9}");
     EXPECT_EQ(c.get_text("AuthenticationMechanismsSupported"), "{3}");
     EXPECT_EQ(c.get_text("Version"), "1.2");
+    EXPECT_EQ(c.get_text("ElementName"), "CIM-XML Communication Mechanism");
+    EXPECT_EQ(c.get_text("CommunicationMechanism"), "2");
+    EXPECT_EQ(c.get_text("OperationalStatus"), "{2}");
     EXPECT_EQ(c.get_text("CIMValidated"), "true");
+    EXPECT_EQ(c.get_text("MultipleOperationsSupported"), "true");
     EXPECT_FALSE(get(c, "SystemName").null);
 
     ch::Result si = served("VESPERA_ProfileSoftwareIdentity");
@@ -167,7 +194,12 @@ TEST_F(Interop, CommunicationMechanismAndIdentity)
     EXPECT_EQ(s.get_text("MajorVersion"), std::to_string(major));
     EXPECT_EQ(s.get_text("MinorVersion"), std::to_string(minor));
     EXPECT_EQ(s.get_text("RevisionNumber"), std::to_string(revision));
+    for (const char* p : { "InstanceID", "Caption", "ElementName", "Description" })
+        EXPECT_EQ(s.get_text(p), "Vespera Adapter CIM Provider") << p;
+    EXPECT_EQ(s.get_text("Name"), "VSPR Adapter CIM provider");
+    EXPECT_EQ(s.get_text("Manufacturer"), "VSPR");
     EXPECT_EQ(s.get_text("Classifications"), "{32775}");
+    EXPECT_EQ(s.get_text("IdentityInfoType"), "{\"SoftwareID\", \"SoftwareStatus\"}");
     EXPECT_EQ(s.get_text("IdentityInfoValue"), "{\"Vespera Adapter CIM Provider\", \"Primary\"}");
 }
 
@@ -204,6 +236,10 @@ TEST_F(Interop, ObjectManagerAndNamespaceTakeTheServersAnswer)
     EXPECT_EQ(n.get_text("Name"), "root/vespera");
     EXPECT_EQ(n.get_text("ClassTypeVersion"), "2.26.0");
     EXPECT_EQ(n.get_text("ClassInfo"), "11");
+    EXPECT_EQ(n.get_text("ClassType"), "2");
+    EXPECT_EQ(n.get_text("CreationClassName"), "VESPERA_Namespace");
+    EXPECT_EQ(n.get_text("ObjectManagerCreationClassName"), "VESPERA_ObjectManager");
+    EXPECT_EQ(n.get_text("SystemCreationClassName"), "VESPERA_ComputerSystem");
     EXPECT_EQ(n.get_text("SystemName"), o.get_text("SystemName"));
 }
 
