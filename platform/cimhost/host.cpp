@@ -1067,7 +1067,6 @@ Host_Impl::~Host_Impl()
     while (!subs.empty())
         unsubscribe(subs.begin()->first);
     cleanup(true);
-    free_arena(host_arena());
     if (dl)
         dlclose(dl);
 }
@@ -1674,15 +1673,30 @@ int Host_Impl::cleanup(bool terminating)
 // Host
 //
 
+// Class knowledge for the object functions comes from the latest host; the
+// host arena is shared, so only the last host to go frees it.
+namespace
+{
+int live_hosts = 0;
+std::vector<Host_Impl*> hosts;
+} // namespace
+
 Host::Host(const Options& options) : impl(new Host_Impl(options))
 {
+    live_hosts++;
+    hosts.push_back(impl);
     the_host = impl;
 }
 
 Host::~Host()
 {
     delete impl;
-    the_host = nullptr;
+    for (size_t i = 0; i < hosts.size(); i++)
+        if (hosts[i] == impl)
+            hosts.erase(hosts.begin() + long(i));
+    the_host = hosts.empty() ? nullptr : hosts.back();
+    if (--live_hosts == 0)
+        free_arena(host_arena());
 }
 
 bool Host::ok() const
