@@ -5,6 +5,7 @@
 
 #include <stdlib.h>
 
+#include <filesystem>
 #include <fstream>
 #include <sstream>
 #include <string>
@@ -27,11 +28,25 @@ inline void writeFile(const std::string& path, const std::string& text)
     std::ofstream(path.c_str(), std::ios::binary | std::ios::trunc) << text;
 }
 
-// A new directory with a .tesselrc that asks for every level.
+// A new directory with a .tesselrc that asks for every level; it goes when
+// the process ends.
 inline std::string makeHome()
 {
+    struct Homes
+    {
+        std::vector<std::string> dirs;
+        ~Homes()
+        {
+            std::error_code ec;
+            for (const std::string& d : dirs)
+                std::filesystem::remove_all(d, ec);
+        }
+    };
+    static Homes homes;
+
     char name[] = "/tmp/vspr-adapter-XXXXXX";
     std::string home = mkdtemp(name) ? name : "";
+    homes.dirs.push_back(home);
     writeFile(home + "/.tesselrc", "LOG_LEVEL=DBG\n");
     return home;
 }
