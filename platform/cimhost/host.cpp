@@ -80,6 +80,13 @@ std::string status_text(const CMPIStatus& st)
     return s && !s->is_null ? s->s : "";
 }
 
+// "activateFilter" or "activateFilter: <the provider's text>".
+std::string with_text(const char* what, const CMPIStatus& st)
+{
+    std::string t = status_text(st);
+    return t.empty() ? std::string(what) : std::string(what) + ": " + t;
+}
+
 // A property list as the char** form.
 struct Prop_List
 {
@@ -1559,7 +1566,7 @@ Result Host_Impl::subscribe(const std::string& ns_in, const std::string& cls, in
         if (st.rc != CMPI_RC_OK)
         {
             r.rc = st.rc;
-            r.message = "authorizeFilter: " + status_text(st);
+            r.message = with_text("authorizeFilter", st);
             continue;
         }
         // The answer is not used: this host never polls.
@@ -1570,7 +1577,7 @@ Result Host_Impl::subscribe(const std::string& ns_in, const std::string& cls, in
         if (st.rc != CMPI_RC_OK)
         {
             r.rc = st.rc;
-            r.message = "activateFilter: " + status_text(st);
+            r.message = with_text("activateFilter", st);
             continue;
         }
         ps.filters++;
@@ -1582,7 +1589,7 @@ Result Host_Impl::subscribe(const std::string& ns_in, const std::string& cls, in
             if (st.rc != CMPI_RC_OK)
             {
                 r.rc = st.rc;
-                r.message = "enableIndications: " + status_text(st);
+                r.message = with_text("enableIndications", st);
             }
         }
     }
@@ -1614,7 +1621,7 @@ Result Host_Impl::unsubscribe(int id)
         if (st.rc != CMPI_RC_OK && r.rc == CMPI_RC_OK)
         {
             r.rc = st.rc;
-            r.message = "deActivateFilter: " + status_text(st);
+            r.message = with_text("deActivateFilter", st);
         }
         if (ps.filters > 0)
             ps.filters--;
@@ -1627,7 +1634,7 @@ Result Host_Impl::unsubscribe(int id)
                 if (st.rc != CMPI_RC_OK && r.rc == CMPI_RC_OK)
                 {
                     r.rc = st.rc;
-                    r.message = "disableIndications: " + status_text(st);
+                    r.message = with_text("disableIndications", st);
                 }
             }
         }
