@@ -70,9 +70,13 @@ struct Meta_Method;
 struct Meta_Repository;
 
 // A literal. Only ever handled through pointers: the pointee is one of the
-// two layouts below, chosen by the owner's type and array-ness. Scalars hold
-// their value in the literal form (uint16 for char16, a zero-terminated text
-// for string and datetime); arrays point at such elements.
+// two layouts below, chosen by the owner's type and array-ness. T is the
+// type's literal form: the number itself, uint16 for char16, and a pointer
+// to a zero-terminated text for string and datetime. An array points at
+// such elements. For example:
+//
+//     static const Meta_Value_Scalar<uint16> _X_Y_value = { {}, 4 };
+//     static const Meta_Value_Scalar<const char*> _X_Z_value = { {}, "text" };
 struct Meta_Value
 {
 };
