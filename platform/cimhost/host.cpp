@@ -1074,8 +1074,9 @@ Host_Impl::~Host_Impl()
     while (!subs.empty())
         unsubscribe(subs.begin()->first);
     cleanup(true);
-    if (dl)
-        dlclose(dl);
+    // The module stays loaded, as it does in a server that shuts down: its
+    // singletons live in its data, and unmapping that would turn them into
+    // leaks for a leak checker and dangle any thread it left behind.
 }
 
 void* Host_Impl::mi_for(const std::string& provider, unsigned kind, const std::string& ns,
