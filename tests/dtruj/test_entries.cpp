@@ -20,6 +20,20 @@ protected:
     }
 };
 
+#define DTRUJ_NAME(name, cls) #name,
+const char* const entryNames[] = {DTRUJ_ENTRIES(DTRUJ_NAME)};
+
+TEST_F(DtrujEntries, AllEntriesExportedAndNothingElse)
+{
+    EXPECT_EQ(117u, sizeof(entryNames) / sizeof(entryNames[0]));
+    for (const char* e : entryNames) {
+        dlerror();
+        EXPECT_NE(nullptr, dlsym(lib.handle, e)) << e;
+    }
+    // Internals stay hidden, so they can't clash with the module's symbols.
+    EXPECT_EQ(nullptr, dlsym(lib.handle, "_ZN4OLMA3Sim5stateEv"));
+}
+
 TEST_F(DtrujEntries, PlainEntriesAndLifecycle)
 {
     auto version = lib.sym<OLMA::voidRetStrFP>("get_agt_version");
