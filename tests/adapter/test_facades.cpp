@@ -75,16 +75,3 @@ TEST(Facades, HDRManagerServesTargetsOnly)
 {
     checkRules(HDRManager::getHDRManager(), hdrRule);
 }
-
-TEST(Facades, PortDiagnosticsAskForTwoClassesInOrder)
-{
-    InProcessLog log;
-    FCHBAManager::getFCHBAManager()->getDiagnosticServicesForFCPort();
-    FCHBAManager::getFCHBAManager()->getDiagnosticServicesForEthernetPort();
-    std::string text = log.text();
-    size_t fc = text.find("Requested classId : 22");
-    size_t pci = text.find("Requested classId : 23");
-    size_t eth = text.find("Requested classId : 24");
-    size_t pci2 = text.find("Requested classId : 23", eth);
-    EXPECT_TRUE(fc < pci && pci < eth && eth < pci2 && pci2 != std::string::npos) << text;
-}
