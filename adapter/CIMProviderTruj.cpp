@@ -11,10 +11,6 @@ namespace OLMA
 void* libHandle = 0;
 bool gTrujLibLoaded = false;
 
-#define VSPR_TRUJ_DEFINE(type, name, global) type global = 0;
-VSPR_TRUJ_ENTRIES(VSPR_TRUJ_DEFINE)
-#undef VSPR_TRUJ_DEFINE
-
 Json::Value default_JsonReqFP(const Json::Value&)
 {
     return Json::Value();
@@ -42,6 +38,12 @@ void default_evtProcessCBRetVoidFP(EventProcessCB)
 void default_log4cxxMsgRetVoidFP(LogMsgCB)
 {
 }
+
+// Each pointer starts as its stub, set before any code runs, so that even a
+// call made ahead of the binding has something to answer it.
+#define VSPR_TRUJ_DEFINE(type, name, global) type global = default_##type;
+VSPR_TRUJ_ENTRIES(VSPR_TRUJ_DEFINE)
+#undef VSPR_TRUJ_DEFINE
 
 // Binds one entry. The stub goes in first so that the pointer is callable
 // whatever dlsym says; an entry that the library lacks keeps it.
