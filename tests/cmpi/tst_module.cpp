@@ -1,0 +1,214 @@
+// The bridge's test module: one provider of TST_Part whose answers the tests
+// choose, registered and exported as the generated glue does for the real
+// providers, and linked the same way.
+
+#include <cstdio>
+#include <cstring>
+#include "tst_classes.h"
+#include "tst_state.h"
+#include "Provider.h"
+#include "Dispatch.h"
+#include "CMPI_Adapter.h"
+#include "cimom.h"
+
+namespace OLMA
+{
+
+static Tst_State _state;
+
+static void _observe(const char* op, const TST_Part* x)
+{
+    snprintf(_state.last_op, sizeof(_state.last_op), "%s", op);
+    _state.name[0] = 0;
+    _state.index = 0;
+    _state.non_null = 0;
+
+    if (!x)
+        return;
+
+    snprintf(_state.name, sizeof(_state.name), "%s", x->Name.value.c_str());
+    _state.index = x->Index.value;
+
+    const Meta_Class* mc = x->meta_class;
+
+    for (size_t i = 0; i < mc->num_meta_features; i++)
+    {
+        const Meta_Feature* mf = mc->meta_features[i];
+        if ((mf->flags & FLAG_PROPERTY) && !(mf->flags & FLAG_KEY) &&
+            !__null_of(x, (const Meta_Property*)mf))
+            _state.non_null++;
+    }
+}
+
+class TST_Part_Provider
+{
+public:
+
+    TST_Part_Provider() { _state.constructed++; }
+
+    ~TST_Part_Provider() { _state.destructed++; }
+
+    Load_Status load()
+    {
+        _state.loads++;
+        if (_state.deny_unload)
+            cimom::allow_unload(false);
+        return LOAD_OK;
+    }
+
+    Unload_Status unload()
+    {
+        _state.unloads++;
+        return UNLOAD_OK;
+    }
+
+    Get_Instance_Status get_instance(const TST_Part* model, TST_Part*& instance)
+    {
+        _observe("get_instance", model);
+        if (_state.get_status == GET_INSTANCE_OK)
+            instance = tst_make_part(model->Name.value.c_str(), model->Index.value);
+        return Get_Instance_Status(_state.get_status);
+    }
+
+    Enum_Instances_Status enum_instances(const TST_Part* model,
+        Enum_Instances_Handler<TST_Part>* handler)
+    {
+        _observe("enum_instances", model);
+        _state.sent = 0;
+        _state.stopped = false;
+
+        for (unsigned i = 0; i < _state.count; i++)
+        {
+            char name[32];
+            snprintf(name, sizeof(name), "part%u", i);
+            TST_Part* p = tst_make_part(name, uint16(i));
+
+            // One plain and one embedded reference to the previous part.
+            if (i > 0)
+            {
+                snprintf(name, sizeof(name), "part%u", i - 1);
+                p->Peer = tst_make_key(name, uint16(i - 1));
+                p->Embedded = tst_make_part(name, uint16(i - 1));
+            }
+
+            _state.sent++;
+
+            if (!handler->handle(p))
+            {
+                _state.stopped = true;
+                break;
+            }
+        }
+
+        return Enum_Instances_Status(_state.enum_status);
+    }
+
+    Create_Instance_Status create_instance(TST_Part* instance)
+    {
+        _observe("create_instance", instance);
+        if (_state.create_status == CREATE_INSTANCE_OK)
+            instance->Index.set(4242);
+        return Create_Instance_Status(_state.create_status);
+    }
+
+    Delete_Instance_Status delete_instance(const TST_Part* instance)
+    {
+        _observe("delete_instance", instance);
+        return Delete_Instance_Status(_state.delete_status);
+    }
+
+    Modify_Instance_Status modify_instance(const TST_Part* model, const TST_Part*)
+    {
+        _observe("modify_instance", model);
+        return Modify_Instance_Status(_state.modify_status);
+    }
+
+    Invoke_Method_Status Frob(const TST_Part* self, const Property<String>& Text,
+        const Property<Array<String> >& Lines, Property<uint32>& Count,
+        TST_Part*& Made, Property<uint32>& return_value)
+    {
+        _observe("Frob", self);
+        snprintf(_state.text, sizeof(_state.text), "%s",
+            Text.null ? "(null)" : Text.value.c_str());
+        _state.lines = Lines.null ? 1000 : (unsigned)Lines.value.size();
+
+        String user;
+        _state.user_ok = cimom::get_username(user);
+        snprintf(_state.user, sizeof(_state.user), "%s", user.c_str());
+
+        Count.set(_state.lines * 2);
+        Made = tst_make_key("made", 9);
+        return_value.set(7);
+        return Invoke_Method_Status(_state.invoke_status);
+    }
+};
+
+static sint32 _TST_Part_Provider_invoke(
+    TST_Part_Provider* provider, const TST_Part* self, Instance* method)
+{
+    const char* name = __method_name(method);
+
+    if (name && strcasecmp(name, "Frob") == 0 && __is_record<TST_Part_Frob_method>(method))
+    {
+        TST_Part_Frob_method* m = (TST_Part_Frob_method*)method;
+        return provider->Frob(self, m->Text, m->Lines, m->Count, m->Made, m->return_value);
+    }
+
+    return -1;
+}
+
+extern "C" sint32 __tessel_TST_Part_Provider_proc(
+    const Registration* registration, int operation,
+    void* arg0, void* arg1, void* arg2, void* arg3,
+    void* arg4, void* arg5, void* arg6, void* arg7)
+{
+    if (operation == OP_INVOKE_METHOD)
+        return _TST_Part_Provider_invoke(
+            (TST_Part_Provider*)arg0, (const TST_Part*)arg1, (Instance*)arg2);
+
+    return __dispatch_instance<TST_Part, TST_Part_Provider>(
+        registration, operation, arg0, arg1, arg2, arg3, arg4, arg5, arg6, arg7);
+}
+
+static Registration _TST_Part_Provider_registration =
+{
+    "vspr_cmpi_test_module",
+    "TST_Part_Provider",
+    __tessel_TST_Part_Provider_proc,
+    &TST_Part::static_meta_class,
+    0,
+};
+
+static CMPI_Static_Data _cmpi_static_dataTST_Part_Provider;
+
+} // namespace OLMA
+
+using namespace OLMA;
+
+extern "C" CMPI_EXPORT Tst_State* tst_state()
+{
+    return &_state;
+}
+
+extern "C" CMPI_EXPORT const Registration* tessel_module()
+{
+    return &_TST_Part_Provider_registration;
+}
+
+extern "C" CMPI_EXPORT CMPIInstanceMI* TST_Part_Provider_Create_InstanceMI(
+    const CMPIBroker* broker, const CMPIContext* context, CMPIStatus*)
+{
+    void* mi = 0;
+    tessel_cmpi_adapter(&_cmpi_static_dataTST_Part_Provider, &_TST_Part_Provider_registration,
+        broker, context, "TST_Part_Provider", 'I', &mi);
+    return (CMPIInstanceMI*)mi;
+}
+
+extern "C" CMPI_EXPORT CMPIMethodMI* TST_Part_Provider_Create_MethodMI(
+    const CMPIBroker* broker, const CMPIContext* context, CMPIStatus*)
+{
+    void* mi = 0;
+    tessel_cmpi_adapter(&_cmpi_static_dataTST_Part_Provider, &_TST_Part_Provider_registration,
+        broker, context, "TST_Part_Provider", 'M', &mi);
+    return (CMPIMethodMI*)mi;
+}

@@ -1,0 +1,53 @@
+#ifndef _OLMA_tst_state_h
+#define _OLMA_tst_state_h
+
+// What the test module's provider does and what it saw. The test programs
+// reach it through the module's exported tst_state().
+
+#include "config.h"
+
+namespace OLMA
+{
+
+struct Tst_State
+{
+    // Statuses that the provider's members return.
+    int get_status;
+    int enum_status;
+    int create_status;
+    int delete_status;
+    int modify_status;
+    int invoke_status;
+
+    // How many instances enum_instances sends, and whether load() asks the
+    // adapter to stay loaded.
+    unsigned count;
+    bool deny_unload;
+
+    // Life cycle.
+    unsigned constructed;
+    unsigned destructed;
+    unsigned loads;
+    unsigned unloads;
+
+    // The last model or instance a member received: its keys, and how many
+    // non-key properties were non-null.
+    char last_op[32];
+    char name[64];
+    unsigned index;
+    unsigned non_null;
+    unsigned sent;
+    bool stopped;
+
+    // The last method call.
+    char text[64];
+    unsigned lines;
+    bool user_ok;
+    char user[64];
+};
+
+} // namespace OLMA
+
+extern "C" OLMA::Tst_State* tst_state();
+
+#endif // _OLMA_tst_state_h
