@@ -372,6 +372,9 @@ TEST_F(HostTest, SubscriptionsCountFiltersAndEnableOnce)
     EXPECT_EQ(1, counters->disable);
     EXPECT_EQ(CMPI_RC_ERR_NOT_FOUND, host->unsubscribe(id2).rc);
     EXPECT_EQ(0u, host->active_filters());
+    // What the provider's thread made was freed when it detached; the
+    // context prepared for it stays with the host.
+    EXPECT_EQ(1u, host->live_objects());
 
     int id = 0;
     EXPECT_EQ(CMPI_RC_ERR_INVALID_CLASS, host->subscribe("root/test", "No_Such", id).rc);
@@ -408,6 +411,28 @@ TEST_F(HostTest, ObjectsOfARequestAreFreedAndCleanupForgetsMIs)
     EXPECT_EQ(0, host->cleanup(false));
     ASSERT_TRUE(host->ei(path_of("root/test:Test_Widget")).ok());
     EXPECT_EQ(creates + 1, counters->creates);
+}
+
+TEST(HostPlain, WithoutClassTablesTheRegistrationFileIsAllItKnows)
+{
+    Options o;
+    o.module_path = TESTPROV_PLAIN_MODULE;
+    o.reg_path = TESTPROV_REG;
+    Host h(o);
+    ASSERT_TRUE(h.ok()) << h.error();
+    EXPECT_TRUE(h.knows_class("Test_Widget"));
+    EXPECT_FALSE(h.knows_class("Test_Base"));
+    EXPECT_EQ(0, h.parameter_type("Test_Widget", "Double", "X"));
+    EXPECT_EQ(CMPI_RC_ERR_INVALID_CLASS, h.ei(path_of("root/test:Test_Base")).rc);
+    EXPECT_EQ(3u, h.ei(path_of("root/test:Test_Widget")).instances.size());
+    // With nothing to tell which associations refer to a widget, every
+    // association provider of the namespace is asked.
+    Result r = h.an(path_of("root/test:Test_Widget.Name=\"a\""));
+    ASSERT_TRUE(r.ok()) << r.message;
+    EXPECT_EQ(2u, r.paths.size());
+    r = h.cm(path_of("root/test:Test_Widget.Name=\"a\""), "IsA",
+             {{"Class", Value::of_string("Test_Widget")}});
+    EXPECT_EQ("3", r.return_value.text());
 }
 
 TEST(HostLoad, MissingModuleOrRegistrationIsAnErrorNotACrash)
