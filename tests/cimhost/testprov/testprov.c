@@ -32,6 +32,11 @@ struct testprov_counters
     int fail_enable;   /* set by a test: enableIndications fails */
 };
 
+#ifdef TESTPROV_NO_TABLES
+/* Both variants may be loaded into one process. */
+#define testprov_counters testprov_plain_counters
+#endif
+
 CMPI_EXPORT struct testprov_counters testprov_counters;
 
 static const CMPIBroker* broker;
