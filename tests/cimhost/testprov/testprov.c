@@ -15,7 +15,7 @@
 #include "cmpimacs.h"
 
 /* What the tests look at. */
-struct testprov_counters
+struct testprov_state
 {
     int creates;
     int cleanups;
@@ -37,7 +37,7 @@ struct testprov_counters
 #define testprov_counters testprov_plain_counters
 #endif
 
-CMPI_EXPORT struct testprov_counters testprov_counters;
+CMPI_EXPORT struct testprov_state testprov_counters;
 
 static const CMPIBroker* broker;
 
