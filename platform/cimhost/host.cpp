@@ -30,15 +30,28 @@ namespace
 
 const char INTEROP_NS[] = "root/PG_InterOp";
 
+// The MIs the host holds of one provider, and its indication bookkeeping
+// (touched only by the thread that drives the host).
 struct Provider_State
 {
-    CMPIInstanceMI* instance_mi = nullptr;
-    CMPIMethodMI* method_mi = nullptr;
-    CMPIAssociationMI* association_mi = nullptr;
-    CMPIIndicationMI* indication_mi = nullptr;
+    void* instance_mi = nullptr;
+    void* method_mi = nullptr;
+    void* association_mi = nullptr;
+    void* indication_mi = nullptr;
     int filters = 0;
     bool enabled = false;
 };
+
+void*& slot_of(Provider_State& ps, unsigned kind)
+{
+    switch (kind)
+    {
+    case MI_INSTANCE: return ps.instance_mi;
+    case MI_ASSOCIATION: return ps.association_mi;
+    case MI_METHOD: return ps.method_mi;
+    default: return ps.indication_mi;
+    }
+}
 
 struct Subscription
 {
@@ -175,6 +188,13 @@ public:
 
     void* mi_for(const std::string& provider, unsigned kind, const std::string& ns, CMPIrc& rc,
                  std::string& msg);
+
+    // Map nodes stay put, so the reference outlives the lock.
+    Provider_State& state(const std::string& provider)
+    {
+        std::lock_guard<std::recursive_mutex> g(mi_mutex);
+        return providers[provider];
+    }
 
     // Registrations of `kind` that serve `cls` in `ns`: the class's own,
     // then (with `subclasses`) those of its subclasses, else those of its
@@ -1083,15 +1103,7 @@ void* Host_Impl::mi_for(const std::string& provider, unsigned kind, const std::s
                         CMPIrc& rc, std::string& msg)
 {
     std::lock_guard<std::recursive_mutex> g(mi_mutex);
-    Provider_State& ps = providers[provider];
-    void** slot = nullptr;
-    switch (kind)
-    {
-    case MI_INSTANCE: slot = reinterpret_cast<void**>(&ps.instance_mi); break;
-    case MI_ASSOCIATION: slot = reinterpret_cast<void**>(&ps.association_mi); break;
-    case MI_METHOD: slot = reinterpret_cast<void**>(&ps.method_mi); break;
-    default: slot = reinterpret_cast<void**>(&ps.indication_mi); break;
-    }
+    void** slot = &slot_of(providers[provider], kind);
     if (*slot)
         return *slot;
     std::string sym = provider + "_Create_" + kind_word(kind) + "MI";
@@ -1561,7 +1573,7 @@ Result Host_Impl::subscribe(const std::string& ns_in, const std::string& cls, in
             r.rc = rc;
             continue;
         }
-        Provider_State& ps = providers[e->provider];
+        Provider_State& ps = state(e->provider);
         CMPIStatus st = mi->ft->authorizeFilter(mi, context(ns), s.filter, cls.c_str(), s.path,
                                                 opts.principal.c_str());
         if (st.rc != CMPI_RC_OK)
@@ -1613,8 +1625,8 @@ Result Host_Impl::unsubscribe(int id)
     subs.erase(it);
     for (const std::string& prov : s.providers)
     {
-        Provider_State& ps = providers[prov];
-        CMPIIndicationMI* mi = ps.indication_mi;
+        Provider_State& ps = state(prov);
+        CMPIIndicationMI* mi = static_cast<CMPIIndicationMI*>(ps.indication_mi);
         if (!mi)
             continue;
         CMPIStatus st = mi->ft->deActivateFilter(mi, context(s.name_space), s.filter,
@@ -1647,32 +1659,56 @@ Result Host_Impl::unsubscribe(int id)
 
 int Host_Impl::cleanup(bool terminating)
 {
-    int refused = 0;
-    std::lock_guard<std::recursive_mutex> g(mi_mutex);
-    for (auto& entry : providers)
+    // Indication MIs first, since their threads may still call the others;
+    // no lock is held across a cleanup, which may wait for such threads.
+    static const unsigned order[] = {MI_INDICATION, MI_ASSOCIATION, MI_METHOD, MI_INSTANCE};
+    std::vector<std::pair<Provider_State*, unsigned>> todo;
     {
-        Provider_State& ps = entry.second;
+        std::lock_guard<std::recursive_mutex> g(mi_mutex);
+        for (unsigned kind : order)
+            for (auto& entry : providers)
+                if (slot_of(entry.second, kind))
+                    todo.push_back({&entry.second, kind});
+    }
+    int refused = 0;
+    for (auto& t : todo)
+    {
+        void* mi;
+        {
+            std::lock_guard<std::recursive_mutex> g(mi_mutex);
+            mi = slot_of(*t.first, t.second);
+        }
+        if (!mi)
+            continue;
         Op_Scope scope;
         CMPIContext* ctx = context(default_ns);
-        auto done = [&](CMPIStatus st) {
-            bool keep = !terminating && (st.rc == CMPI_RC_DO_NOT_UNLOAD ||
-                                         st.rc == CMPI_RC_NEVER_UNLOAD);
-            if (keep)
-                refused++;
-            return keep;
-        };
-        // Indication MIs first: their threads may still call the others.
-        if (ps.indication_mi && !done(ps.indication_mi->ft->cleanup(ps.indication_mi, ctx,
-                                                                     terminating)))
-            ps.indication_mi = nullptr;
-        if (ps.association_mi && !done(ps.association_mi->ft->cleanup(ps.association_mi, ctx,
-                                                                       terminating)))
-            ps.association_mi = nullptr;
-        if (ps.method_mi && !done(ps.method_mi->ft->cleanup(ps.method_mi, ctx, terminating)))
-            ps.method_mi = nullptr;
-        if (ps.instance_mi &&
-            !done(ps.instance_mi->ft->cleanup(ps.instance_mi, ctx, terminating)))
-            ps.instance_mi = nullptr;
+        CMPIStatus st;
+        switch (t.second)
+        {
+        case MI_INDICATION:
+            st = static_cast<CMPIIndicationMI*>(mi)->ft->cleanup(
+                static_cast<CMPIIndicationMI*>(mi), ctx, terminating);
+            break;
+        case MI_ASSOCIATION:
+            st = static_cast<CMPIAssociationMI*>(mi)->ft->cleanup(
+                static_cast<CMPIAssociationMI*>(mi), ctx, terminating);
+            break;
+        case MI_METHOD:
+            st = static_cast<CMPIMethodMI*>(mi)->ft->cleanup(static_cast<CMPIMethodMI*>(mi), ctx,
+                                                             terminating);
+            break;
+        default:
+            st = static_cast<CMPIInstanceMI*>(mi)->ft->cleanup(static_cast<CMPIInstanceMI*>(mi),
+                                                               ctx, terminating);
+            break;
+        }
+        if (!terminating && (st.rc == CMPI_RC_DO_NOT_UNLOAD || st.rc == CMPI_RC_NEVER_UNLOAD))
+        {
+            refused++;
+            continue;
+        }
+        std::lock_guard<std::recursive_mutex> g(mi_mutex);
+        slot_of(*t.first, t.second) = nullptr;
     }
     return refused;
 }
