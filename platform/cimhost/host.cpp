@@ -82,6 +82,11 @@ enum Assoc_Op
     A_REFERENCE_NAMES,
 };
 
+// A slot a provider left empty answers as a server would for an operation
+// the provider doesn't offer.
+#define MI_CALL(mi, slot, ...) \
+    ((mi)->ft->slot ? (mi)->ft->slot((mi), __VA_ARGS__) : status(CMPI_RC_ERR_NOT_SUPPORTED))
+
 const char* c_or_null(const std::string& s)
 {
     return s.empty() ? nullptr : s.c_str();
@@ -1250,9 +1255,9 @@ CMPIrc Host_Impl::do_enum(Object_Path cls, const char** props, bool names,
         p.name_space = cls.name_space;
         p.class_name = e->class_name;
         Collector c;
-        CMPIStatus st = names ? mi->ft->enumerateInstanceNames(mi, context(cls.name_space),
+        CMPIStatus st = names ? MI_CALL(mi, enumerateInstanceNames, context(cls.name_space),
                                                                new_result(&c), new_path(p))
-                              : mi->ft->enumerateInstances(mi, context(cls.name_space),
+                              : MI_CALL(mi, enumerateInstances, context(cls.name_space),
                                                            new_result(&c), new_path(p), props);
         fill_from(out, c);
         // Asked on behalf of a superclass, a provider that can't enumerate
@@ -1298,7 +1303,7 @@ CMPIrc Host_Impl::do_get(Object_Path path, const char** props, Value& out, std::
     if (!mi)
         return rc;
     Collector c;
-    CMPIStatus st = mi->ft->getInstance(mi, context(path.name_space), new_result(&c),
+    CMPIStatus st = MI_CALL(mi, getInstance, context(path.name_space), new_result(&c),
                                         new_path(path), props);
     if (st.rc != CMPI_RC_OK)
     {
@@ -1330,7 +1335,7 @@ CMPIrc Host_Impl::do_create(Object_Path path, const Instance& inst, Object_Path&
     if (!mi)
         return rc;
     Collector c;
-    CMPIStatus st = mi->ft->createInstance(mi, context(path.name_space), new_result(&c),
+    CMPIStatus st = MI_CALL(mi, createInstance, context(path.name_space), new_result(&c),
                                            new_path(path), new_instance(inst));
     msg = status_text(st);
     if (st.rc == CMPI_RC_OK)
@@ -1358,7 +1363,7 @@ CMPIrc Host_Impl::do_modify(Object_Path path, const Instance& inst, const char**
     if (!mi)
         return rc;
     Collector c;
-    CMPIStatus st = mi->ft->modifyInstance(mi, context(path.name_space), new_result(&c),
+    CMPIStatus st = MI_CALL(mi, modifyInstance, context(path.name_space), new_result(&c),
                                            new_path(path), new_instance(inst), props);
     msg = status_text(st);
     return st.rc;
@@ -1379,7 +1384,7 @@ CMPIrc Host_Impl::do_delete(Object_Path path, std::string& msg)
         return rc;
     Collector c;
     CMPIStatus st =
-        mi->ft->deleteInstance(mi, context(path.name_space), new_result(&c), new_path(path));
+        MI_CALL(mi, deleteInstance, context(path.name_space), new_result(&c), new_path(path));
     msg = status_text(st);
     return st.rc;
 }
@@ -1399,7 +1404,7 @@ CMPIrc Host_Impl::do_query(Object_Path cls, const std::string& query, const std:
     if (!mi)
         return rc;
     Collector c;
-    CMPIStatus st = mi->ft->execQuery(mi, context(cls.name_space), new_result(&c), new_path(cls),
+    CMPIStatus st = MI_CALL(mi, execQuery, context(cls.name_space), new_result(&c), new_path(cls),
                                       query.c_str(), lang.c_str());
     msg = status_text(st);
     fill_from(out, c);
@@ -1471,21 +1476,21 @@ CMPIrc Host_Impl::do_assoc(Assoc_Op op, Object_Path path, const std::string& ass
         switch (op)
         {
         case A_ASSOCIATORS:
-            st = mi->ft->associators(mi, ctx, res, cp, c_or_null(assoc_class),
+            st = MI_CALL(mi, associators, ctx, res, cp, c_or_null(assoc_class),
                                      c_or_null(result_class), c_or_null(role),
                                      c_or_null(result_role), props);
             break;
         case A_ASSOCIATOR_NAMES:
-            st = mi->ft->associatorNames(mi, ctx, res, cp, c_or_null(assoc_class),
+            st = MI_CALL(mi, associatorNames, ctx, res, cp, c_or_null(assoc_class),
                                          c_or_null(result_class), c_or_null(role),
                                          c_or_null(result_role));
             break;
         case A_REFERENCES:
-            st = mi->ft->references(mi, ctx, res, cp, c_or_null(result_class), c_or_null(role),
+            st = MI_CALL(mi, references, ctx, res, cp, c_or_null(result_class), c_or_null(role),
                                     props);
             break;
         default:
-            st = mi->ft->referenceNames(mi, ctx, res, cp, c_or_null(result_class),
+            st = MI_CALL(mi, referenceNames, ctx, res, cp, c_or_null(result_class),
                                         c_or_null(role));
             break;
         }
@@ -1522,7 +1527,7 @@ CMPIrc Host_Impl::do_invoke(Object_Path path, const std::string& method,
         return rc;
     Collector c;
     CMPIArgs* out_args = new_args({});
-    CMPIStatus st = mi->ft->invokeMethod(mi, context(path.name_space), new_result(&c),
+    CMPIStatus st = MI_CALL(mi, invokeMethod, context(path.name_space), new_result(&c),
                                          new_path(path), method.c_str(), new_args(in), out_args);
     msg = status_text(st);
     if (st.rc != CMPI_RC_OK)
@@ -1574,7 +1579,7 @@ Result Host_Impl::subscribe(const std::string& ns_in, const std::string& cls, in
             continue;
         }
         Provider_State& ps = state(e->provider);
-        CMPIStatus st = mi->ft->authorizeFilter(mi, context(ns), s.filter, cls.c_str(), s.path,
+        CMPIStatus st = MI_CALL(mi, authorizeFilter, context(ns), s.filter, cls.c_str(), s.path,
                                                 opts.principal.c_str());
         if (st.rc != CMPI_RC_OK)
         {
@@ -1585,7 +1590,7 @@ Result Host_Impl::subscribe(const std::string& ns_in, const std::string& cls, in
         // The answer is not used: this host never polls.
         if (mi->ft->mustPoll)
             mi->ft->mustPoll(mi, context(ns), s.filter, cls.c_str(), s.path);
-        st = mi->ft->activateFilter(mi, context(ns), s.filter, cls.c_str(), s.path,
+        st = MI_CALL(mi, activateFilter, context(ns), s.filter, cls.c_str(), s.path,
                                     ps.filters == 0);
         if (st.rc != CMPI_RC_OK)
         {
@@ -1629,7 +1634,7 @@ Result Host_Impl::unsubscribe(int id)
         CMPIIndicationMI* mi = static_cast<CMPIIndicationMI*>(ps.indication_mi);
         if (!mi)
             continue;
-        CMPIStatus st = mi->ft->deActivateFilter(mi, context(s.name_space), s.filter,
+        CMPIStatus st = MI_CALL(mi, deActivateFilter, context(s.name_space), s.filter,
                                                  s.class_name.c_str(), s.path, ps.filters == 1);
         if (st.rc != CMPI_RC_OK && r.rc == CMPI_RC_OK)
         {
@@ -1686,20 +1691,16 @@ int Host_Impl::cleanup(bool terminating)
         switch (t.second)
         {
         case MI_INDICATION:
-            st = static_cast<CMPIIndicationMI*>(mi)->ft->cleanup(
-                static_cast<CMPIIndicationMI*>(mi), ctx, terminating);
+            st = MI_CALL(static_cast<CMPIIndicationMI*>(mi), cleanup, ctx, terminating);
             break;
         case MI_ASSOCIATION:
-            st = static_cast<CMPIAssociationMI*>(mi)->ft->cleanup(
-                static_cast<CMPIAssociationMI*>(mi), ctx, terminating);
+            st = MI_CALL(static_cast<CMPIAssociationMI*>(mi), cleanup, ctx, terminating);
             break;
         case MI_METHOD:
-            st = static_cast<CMPIMethodMI*>(mi)->ft->cleanup(static_cast<CMPIMethodMI*>(mi), ctx,
-                                                             terminating);
+            st = MI_CALL(static_cast<CMPIMethodMI*>(mi), cleanup, ctx, terminating);
             break;
         default:
-            st = static_cast<CMPIInstanceMI*>(mi)->ft->cleanup(static_cast<CMPIInstanceMI*>(mi),
-                                                               ctx, terminating);
+            st = MI_CALL(static_cast<CMPIInstanceMI*>(mi), cleanup, ctx, terminating);
             break;
         }
         if (!terminating && (st.rc == CMPI_RC_DO_NOT_UNLOAD || st.rc == CMPI_RC_NEVER_UNLOAD))
