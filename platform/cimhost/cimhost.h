@@ -257,6 +257,15 @@ public:
     // narrower integers), so that it matches what a provider expects.
     void type_keys(Object_Path& path) const;
 
+    // Reading user input as the command line does. parse_object_path()
+    // parses, checks that the class is known and types the keys;
+    // parse_argument() reads "NAME=TYPE:VALUE", or "NAME=VALUE" with the type
+    // of the method's parameter from the class tables. False with a one-line
+    // reason for unknown classes and untyped or mistyped values.
+    bool parse_object_path(const std::string& text, Object_Path& path, std::string& err) const;
+    bool parse_argument(const Object_Path& path, const std::string& method,
+                        const std::string& text, Property& arg, std::string& err) const;
+
     // Raw access for tests that talk CMPI themselves.
     const CMPIBroker* broker() const;
     // Number of CMPI objects alive now (released ones excluded); 0 between

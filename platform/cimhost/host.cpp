@@ -2055,6 +2055,75 @@ void Host::type_keys(Object_Path& path) const
     }
 }
 
+bool Host::parse_object_path(const std::string& text, Object_Path& path, std::string& err) const
+{
+    if (!parse_path(text, path, err, impl->default_ns))
+        return false;
+    if (!knows_class(path.class_name))
+    {
+        err = "unknown class " + path.class_name;
+        return false;
+    }
+    type_keys(path);
+    return true;
+}
+
+bool Host::parse_argument(const Object_Path& path, const std::string& method,
+                          const std::string& text, Property& arg, std::string& err) const
+{
+    size_t eq = text.find('=');
+    if (eq == std::string::npos || eq == 0)
+    {
+        err = "argument '" + text + "' is not NAME=VALUE";
+        return false;
+    }
+    arg = Property();
+    arg.name = text.substr(0, eq);
+    std::string value = text.substr(eq + 1);
+    size_t colon = value.find(':');
+    std::string prefix = colon == std::string::npos ? "" : value.substr(0, colon);
+    if (prefix.size() > 2 && prefix.compare(prefix.size() - 2, 2, "[]") == 0)
+        prefix.resize(prefix.size() - 2);
+    // A namespace before a path ("root/x:...") is no type, so the tables decide.
+    if (!prefix.empty() && (type_of_name(prefix) || name_eq(prefix, "null")))
+    {
+        if (!parse_typed_value(value, arg.value, err))
+        {
+            err = "argument " + arg.name + ": " + err;
+            return false;
+        }
+    }
+    else
+    {
+        CMPIType t = parameter_type(path.class_name, method, arg.name);
+        if (!t)
+        {
+            err = "argument " + arg.name + ": untyped value; write " + arg.name + "=TYPE:VALUE";
+            return false;
+        }
+        if ((t & ~CMPI_ARRAY) == CMPI_instance)
+        {
+            err = "argument " + arg.name + ": embedded instances can't be given as text";
+            return false;
+        }
+        if (!parse_value_as(t, value, arg.value, err))
+        {
+            err = "argument " + arg.name + ": " + err;
+            return false;
+        }
+    }
+    if (arg.value.type == CMPI_ref && arg.value.ref)
+    {
+        if (!knows_class(arg.value.ref->class_name))
+        {
+            err = "argument " + arg.name + ": unknown class " + arg.value.ref->class_name;
+            return false;
+        }
+        type_keys(*arg.value.ref);
+    }
+    return true;
+}
+
 const CMPIBroker* Host::broker() const
 {
     return &impl->broker;

@@ -255,13 +255,10 @@ Object_Path read_path(Host& host, const std::string& text, bool class_only)
 {
     Object_Path p;
     std::string err;
-    if (!parse_path(text, p, err))
+    if (!host.parse_object_path(text, p, err))
         bad(err);
-    if (!host.knows_class(p.class_name))
-        bad("unknown class " + p.class_name);
     if (class_only && !p.keys.empty())
         bad("'" + text + "' names an instance; give NAMESPACE:CLASS");
-    host.type_keys(p);
     return p;
 }
 
@@ -271,42 +268,13 @@ void check_class(Host& host, const std::string& cls)
         bad("unknown class " + cls);
 }
 
-// A cm argument: typed by its prefix, else by the class tables.
 Property read_arg(Host& host, const Object_Path& path, const std::string& method,
                   const std::string& text)
 {
-    size_t eq = text.find('=');
-    if (eq == std::string::npos || eq == 0)
-        bad("argument '" + text + "' is not NAME=VALUE");
     Property p;
-    p.name = text.substr(0, eq);
-    std::string value = text.substr(eq + 1);
     std::string err;
-    size_t colon = value.find(':');
-    std::string prefix = colon == std::string::npos ? "" : value.substr(0, colon);
-    if (prefix.size() > 2 && prefix.compare(prefix.size() - 2, 2, "[]") == 0)
-        prefix.resize(prefix.size() - 2);
-    if (!prefix.empty() && (type_of_name(prefix) || name_eq(prefix, "null")))
-    {
-        if (!parse_typed_value(value, p.value, err))
-            bad("argument " + p.name + ": " + err);
-    }
-    else
-    {
-        CMPIType t = host.parameter_type(path.class_name, method, p.name);
-        if (!t)
-            bad("argument " + p.name + ": untyped value; write " + p.name + "=TYPE:VALUE");
-        if (t == CMPI_instance || t == (CMPI_instance | CMPI_ARRAY))
-            bad("argument " + p.name + ": embedded instances can't be given on the command line");
-        if (!parse_value_as(t, value, p.value, err))
-            bad("argument " + p.name + ": " + err);
-    }
-    if (p.value.type == CMPI_ref && p.value.ref)
-    {
-        if (!host.knows_class(p.value.ref->class_name))
-            bad("argument " + p.name + ": unknown class " + p.value.ref->class_name);
-        host.type_keys(*p.value.ref);
-    }
+    if (!host.parse_argument(path, method, text, p, err))
+        bad(err);
     return p;
 }
 
