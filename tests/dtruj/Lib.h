@@ -39,6 +39,8 @@ struct Lib {
     template <class F>
     F sym(const char* name)
     {
+        if (!handle)
+            return nullptr;
         dlerror();
         void* p = dlsym(handle, name);
         const char* err = dlerror();
@@ -51,7 +53,7 @@ struct Lib {
 
     Json::Value call(const char* entry, const Json::Value& req = Json::Value())
     {
-        OLMA::JsonReqFP f = sym<OLMA::JsonReqFP>(entry);
+        OLMA::JsonReqFP f = handle ? sym<OLMA::JsonReqFP>(entry) : nullptr;
         return f ? f(req) : Json::Value();
     }
 
@@ -59,6 +61,7 @@ struct Lib {
     void reset()
     {
         auto r = sym<int (*)()>("dtruj_sim_reset");
+        ASSERT_NE(nullptr, r);
         ASSERT_EQ(0, r());
         Json::Value req;
         req["appId"] = 2;
@@ -67,12 +70,14 @@ struct Lib {
 
     int setFault(const char* entry, const char* kind)
     {
-        return sym<int (*)(const char*, const char*)>("dtruj_sim_set_fault")(entry, kind);
+        auto f = sym<int (*)(const char*, const char*)>("dtruj_sim_set_fault");
+        return f ? f(entry, kind) : -2;
     }
 
     int inject(const char* json)
     {
-        return sym<int (*)(const char*)>("dtruj_sim_inject_event")(json);
+        auto f = sym<int (*)(const char*)>("dtruj_sim_inject_event");
+        return f ? f(json) : -2;
     }
 };
 
