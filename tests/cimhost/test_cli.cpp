@@ -66,7 +66,7 @@ const char widget_a[] = "root/test:Test_Widget.Name=\"a\"";
 
 } // namespace
 
-TEST(Cli, HelpDocumentsEveryVerbAndOption)
+TEST(CimhostCli, HelpDocumentsEveryVerbAndOption)
 {
     Outcome r = cimhost({"--help"}, false);
     EXPECT_EQ(0, r.status);
@@ -77,7 +77,7 @@ TEST(Cli, HelpDocumentsEveryVerbAndOption)
         EXPECT_NE(std::string::npos, r.out.find(word)) << word;
 }
 
-TEST(Cli, BadInputIsOneLineAndStatusTwo)
+TEST(CimhostCli, BadInputIsOneLineAndStatusTwo)
 {
     const std::vector<std::vector<std::string>> cases = {
         {},
@@ -110,7 +110,7 @@ TEST(Cli, BadInputIsOneLineAndStatusTwo)
     }
 }
 
-TEST(Cli, FailuresNameTheReturnCode)
+TEST(CimhostCli, FailuresNameTheReturnCode)
 {
     Outcome r = cimhost({"gi", "root/test:Test_Widget.Name=\"zz\""});
     EXPECT_EQ(1, r.status);
@@ -127,7 +127,7 @@ TEST(Cli, FailuresNameTheReturnCode)
     EXPECT_EQ(1, r.status);
 }
 
-TEST(Cli, JsonCarriesTypesAndTextIsReadable)
+TEST(CimhostCli, JsonCarriesTypesAndTextIsReadable)
 {
     Outcome r = cimhost({"--json", "ei", "root/test:Test_Widget", "--props", "Size,Tags"});
     ASSERT_EQ(0, r.status) << r.err;
@@ -170,7 +170,7 @@ TEST(Cli, JsonCarriesTypesAndTextIsReadable)
     EXPECT_NE(std::string::npos, r.out.find("    Size = 1;")) << r.out;
 }
 
-TEST(Cli, ListenPrintsIndicationsAndUnsubscribes)
+TEST(CimhostCli, ListenPrintsIndicationsAndUnsubscribes)
 {
     Outcome r = cimhost({"--json", "listen", "root/test:Test_Event", "--seconds", "1"});
     ASSERT_EQ(0, r.status) << r.err;

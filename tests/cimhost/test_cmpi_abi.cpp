@@ -97,7 +97,7 @@ CMPIStatus returns_with(CMPIString* s) { CMReturnWithString(CMPI_RC_ERR_NOT_FOUN
 
 }  // namespace
 
-TEST(CmpiMacros, StatusHelpersAndDataTests)
+TEST(CmpiHeaders, StatusHelpersAndDataTests)
 {
   CMPIStatus st = returns_with(nullptr);
   EXPECT_EQ(CMPI_RC_ERR_NOT_FOUND, st.rc);

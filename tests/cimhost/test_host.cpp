@@ -55,7 +55,7 @@ const Value* out_arg(const Result& r, const std::string& name)
     return nullptr;
 }
 
-class HostTest : public ::testing::Test
+class CimhostHost : public ::testing::Test
 {
 protected:
     Options opts()
@@ -92,7 +92,7 @@ protected:
 
 } // namespace
 
-TEST_F(HostTest, EnumerationKeepsEveryPropertyTypeAndNull)
+TEST_F(CimhostHost, EnumerationKeepsEveryPropertyTypeAndNull)
 {
     Result r = host->ei(path_of("root/test:Test_Widget"));
     ASSERT_TRUE(r.ok()) << rc_name(r.rc) << " " << r.message;
@@ -121,7 +121,7 @@ TEST_F(HostTest, EnumerationKeepsEveryPropertyTypeAndNull)
     EXPECT_EQ(0u, host->live_objects());
 }
 
-TEST_F(HostTest, GetInstanceAndPropertyFilter)
+TEST_F(CimhostHost, GetInstanceAndPropertyFilter)
 {
     Result r = host->gi(path_of("root/test:Test_Widget.Name=\"b\""));
     ASSERT_TRUE(r.ok());
@@ -150,7 +150,7 @@ TEST_F(HostTest, GetInstanceAndPropertyFilter)
     EXPECT_EQ(CMPI_uint64, r.instances[0].path.key("Id")->type);
 }
 
-TEST_F(HostTest, WritesAndQueriesReachTheirOwnSlots)
+TEST_F(CimhostHost, WritesAndQueriesReachTheirOwnSlots)
 {
     Object_Path cls = path_of("root/test:Test_Widget");
     Instance w;
@@ -181,7 +181,7 @@ TEST_F(HostTest, WritesAndQueriesReachTheirOwnSlots)
     EXPECT_EQ(0u, host->live_objects());
 }
 
-TEST_F(HostTest, RoutingByClassHierarchyAndNamespace)
+TEST_F(CimhostHost, RoutingByClassHierarchyAndNamespace)
 {
     // No provider serves Test_Base; its subclasses' providers answer.
     Result r = host->ei(path_of("root/test:Test_Base"));
@@ -198,7 +198,7 @@ TEST_F(HostTest, RoutingByClassHierarchyAndNamespace)
     EXPECT_EQ(CMPI_ref, host->parameter_type("Test_Widget", "Lookup", "Target"));
 }
 
-TEST_F(HostTest, MethodsWithArgumentsStatusesAndMessages)
+TEST_F(CimhostHost, MethodsWithArgumentsStatusesAndMessages)
 {
     Result r = call("Double", {{"X", typed("uint32:21")}});
     ASSERT_TRUE(r.ok()) << r.message;
@@ -218,7 +218,7 @@ TEST_F(HostTest, MethodsWithArgumentsStatusesAndMessages)
     EXPECT_EQ("cimhost", out_arg(r, "User")->str);
 }
 
-TEST_F(HostTest, ArgumentsOfEveryTypeSurviveTheRoundTrip)
+TEST_F(CimhostHost, ArgumentsOfEveryTypeSurviveTheRoundTrip)
 {
     std::vector<Property> in = {
         {"B", typed("boolean:true")},
@@ -253,7 +253,7 @@ TEST_F(HostTest, ArgumentsOfEveryTypeSurviveTheRoundTrip)
     EXPECT_EQ(0u, host->live_objects());
 }
 
-TEST_F(HostTest, UpCallsReachOtherProvidersOnTheSameThread)
+TEST_F(CimhostHost, UpCallsReachOtherProvidersOnTheSameThread)
 {
     // CBGetInstance from the widget's method MI into its own instance MI.
     Result r = call("Lookup", {{"Target", typed("ref:root/test:Test_Widget.Name=\"b\"")}});
@@ -282,7 +282,7 @@ TEST_F(HostTest, UpCallsReachOtherProvidersOnTheSameThread)
     EXPECT_EQ(0u, host->live_objects());
 }
 
-TEST_F(HostTest, InteropStandInCanBeEmptiedOrSwitchedOff)
+TEST_F(CimhostHost, InteropStandInCanBeEmptiedOrSwitchedOff)
 {
     Result r = call("Interop");
     ASSERT_TRUE(r.ok());
@@ -301,7 +301,7 @@ TEST_F(HostTest, InteropStandInCanBeEmptiedOrSwitchedOff)
     EXPECT_EQ("0", out_arg(r, "Count")->text());
 }
 
-TEST_F(HostTest, AssociationsThroughTheRegisteredProviders)
+TEST_F(CimhostHost, AssociationsThroughTheRegisteredProviders)
 {
     Object_Path a = path_of("root/test:Test_Widget.Name=\"a\"");
     Object_Path g2 = path_of("root/test:Test_Gadget.Id=2");
@@ -337,7 +337,7 @@ TEST_F(HostTest, AssociationsThroughTheRegisteredProviders)
     EXPECT_EQ(0u, host->live_objects());
 }
 
-TEST_F(HostTest, SubscriptionsCountFiltersAndEnableOnce)
+TEST_F(CimhostHost, SubscriptionsCountFiltersAndEnableOnce)
 {
     int id1 = 0, id2 = 0;
     Result r = host->subscribe("root/test", "Test_Event", id1);
@@ -381,7 +381,7 @@ TEST_F(HostTest, SubscriptionsCountFiltersAndEnableOnce)
     EXPECT_EQ(CMPI_RC_ERR_NOT_SUPPORTED, host->subscribe("root/test", "Test_Widget", id).rc);
 }
 
-TEST_F(HostTest, FailedEnableIsReportedAndCleanedUpAtExit)
+TEST_F(CimhostHost, FailedEnableIsReportedAndCleanedUpAtExit)
 {
     counters->fail_enable = 1;
     int id = 0;
@@ -394,7 +394,7 @@ TEST_F(HostTest, FailedEnableIsReportedAndCleanedUpAtExit)
     EXPECT_EQ(1, counters->disable);
 }
 
-TEST_F(HostTest, ObjectsOfARequestAreFreedAndCleanupForgetsMIs)
+TEST_F(CimhostHost, ObjectsOfARequestAreFreedAndCleanupForgetsMIs)
 {
     Result r = call("Leak");
     ASSERT_TRUE(r.ok()) << r.message;
@@ -413,7 +413,7 @@ TEST_F(HostTest, ObjectsOfARequestAreFreedAndCleanupForgetsMIs)
     EXPECT_EQ(creates + 1, counters->creates);
 }
 
-TEST(HostPlain, WithoutClassTablesTheRegistrationFileIsAllItKnows)
+TEST(CimhostPlain, WithoutClassTablesTheRegistrationFileIsAllItKnows)
 {
     Options o;
     o.module_path = TESTPROV_PLAIN_MODULE;
@@ -435,7 +435,7 @@ TEST(HostPlain, WithoutClassTablesTheRegistrationFileIsAllItKnows)
     EXPECT_EQ("3", r.return_value.text());
 }
 
-TEST(HostLoad, MissingModuleOrRegistrationIsAnErrorNotACrash)
+TEST(CimhostLoad, MissingModuleOrRegistrationIsAnErrorNotACrash)
 {
     Options o;
     o.module_path = "/nonexistent/libnothing.so";

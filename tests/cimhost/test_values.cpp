@@ -11,7 +11,7 @@
 
 using namespace OLMA::cimhost;
 
-TEST(PathText, ParsesKeysOfEveryKindAndPrintsThemBack)
+TEST(CimhostPathText, ParsesKeysOfEveryKindAndPrintsThemBack)
 {
     Object_Path p;
     std::string err;
@@ -35,7 +35,7 @@ TEST(PathText, ParsesKeysOfEveryKindAndPrintsThemBack)
     EXPECT_TRUE(path_equal(p, again));
 }
 
-TEST(PathText, QuotedPathsAreReferencesAndNestWithEscapes)
+TEST(CimhostPathText, QuotedPathsAreReferencesAndNestWithEscapes)
 {
     Object_Path inner;
     inner.name_space = "root/vespera";
@@ -56,7 +56,7 @@ TEST(PathText, QuotedPathsAreReferencesAndNestWithEscapes)
     EXPECT_TRUE(path_equal(outer, back));
 }
 
-TEST(PathText, HostDefaultNamespaceAndClassOnly)
+TEST(CimhostPathText, HostDefaultNamespaceAndClassOnly)
 {
     Object_Path p;
     std::string err;
@@ -68,7 +68,7 @@ TEST(PathText, HostDefaultNamespaceAndClassOnly)
     EXPECT_EQ("root/dflt", p.name_space);
 }
 
-TEST(PathText, BadInputGivesAReasonNotACrash)
+TEST(CimhostPathText, BadInputGivesAReasonNotACrash)
 {
     const char* bad[] = {
         "",
@@ -94,7 +94,7 @@ TEST(PathText, BadInputGivesAReasonNotACrash)
     }
 }
 
-TEST(PathEquality, ClassAndNamespaceIgnoreCaseKeyValuesDoNot)
+TEST(CimhostPathEquality, ClassAndNamespaceIgnoreCaseKeyValuesDoNot)
 {
     Object_Path a, b;
     std::string err;
@@ -109,7 +109,7 @@ TEST(PathEquality, ClassAndNamespaceIgnoreCaseKeyValuesDoNot)
     EXPECT_TRUE(path_equal(a, b));
 }
 
-TEST(TypedValues, EachTypeReadsAndRejectsWhatItShould)
+TEST(CimhostTypedValues, EachTypeReadsAndRejectsWhatItShould)
 {
     struct Case
     {
@@ -169,7 +169,7 @@ TEST(TypedValues, EachTypeReadsAndRejectsWhatItShould)
     }
 }
 
-TEST(Datetimes, BinaryFormRoundTripsAndHonoursTheOffset)
+TEST(CimhostDatetimes, BinaryFormRoundTripsAndHonoursTheOffset)
 {
     // 2024-01-02 03:04:05.000006 at UTC+60 minutes is 02:04:05 UTC.
     uint64_t usec = datetime_to_binary("20240102030405.000006+060");
@@ -198,7 +198,7 @@ std::string write_temp(const std::string& text)
 
 } // namespace
 
-TEST(RegFile, ReadsSectionsKindsAndNamespaces)
+TEST(CimhostRegFile, ReadsSectionsKindsAndNamespaces)
 {
     std::vector<Registration_Entry> e;
     std::string err;
@@ -224,7 +224,7 @@ TEST(RegFile, ReadsSectionsKindsAndNamespaces)
     EXPECT_EQ(1u, indication);
 }
 
-TEST(RegFile, MalformedFilesNameTheLine)
+TEST(CimhostRegFile, MalformedFilesNameTheLine)
 {
     const char* bad[] = {
         "provider: X\n",
