@@ -190,9 +190,13 @@ public:
     // Switch the "root/PG_InterOp" stand-in on or off between operations.
     void set_interop(bool on, bool empty = false);
 
-    // Operations. `props` null means all properties. For ei/ein the path
-    // gives namespace and class; a class without its own provider is served
-    // by the providers of its registered subclasses.
+    // Operations. `props` null means all properties, and the host passes the
+    // list to the provider without filtering the answer itself. For ei/ein
+    // the path gives namespace and class; the providers of the class and of
+    // its registered subclasses answer. An empty namespace means the first
+    // one of the registration file. The host checks the namespace and the
+    // class (CMPI_RC_ERR_INVALID_NAMESPACE, CMPI_RC_ERR_INVALID_CLASS) before
+    // any provider is asked.
     Result ei(const Object_Path& cls, const std::vector<std::string>* props = nullptr);
     Result ein(const Object_Path& cls);
     Result gi(const Object_Path& path, const std::vector<std::string>* props = nullptr);
