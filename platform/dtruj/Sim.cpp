@@ -19,6 +19,11 @@
 namespace OLMA {
 namespace Sim {
 
+State::~State()
+{
+    stopEvents(*this);
+}
+
 State& state()
 {
     static State s;
@@ -662,7 +667,7 @@ struct EventSource {
     }
 };
 
-static void eventThread(State* s, std::string path)
+static void eventThread(State* s, std::string path, unsigned generation)
 {
     EventSource src;
     off_t offset;
@@ -678,12 +683,14 @@ static void eventThread(State* s, std::string path)
         std::deque<std::string> batch;
         {
             std::unique_lock<std::mutex> g(s->evMtx);
+            if (s->evGeneration != generation)
+                break;
             s->evFileOffset = offset;
             for (auto& l : lines)
                 s->evQueue.push_back(l);
             if (s->evQueue.empty() && !s->evStop)
                 s->evCv.wait_for(g, std::chrono::milliseconds(50));
-            if (s->evStop)
+            if (s->evStop || s->evGeneration != generation)
                 break;
             batch.swap(s->evQueue);
         }
@@ -707,8 +714,9 @@ bool startEvents(State& s, bool dropOld)
         return true;
     s.evRegistered = true;
     s.evStop = false;
+    ++s.evGeneration;
     const char* path = getenv("DTRUJ_EVENTS");
-    s.evThread = std::thread(eventThread, &s, std::string(path ? path : ""));
+    s.evThread = std::thread(eventThread, &s, std::string(path ? path : ""), s.evGeneration);
     return true;
 }
 

@@ -40,6 +40,8 @@ struct DiagRun {
 };
 
 struct State {
+    ~State();                       // joins the event thread a caller left running
+
     std::mutex mtx;                 // guards everything below but the event queue
     bool loaded = false;
     bool initialised = false;
@@ -59,6 +61,7 @@ struct State {
     std::deque<std::string> evQueue;
     bool evRegistered = false;
     bool evStop = false;
+    unsigned evGeneration = 0;      // a thread let go by stopEvents ends when this moves on
     std::thread evThread;
     off_t evFileOffset = 0;
 };

@@ -166,3 +166,23 @@ TEST_F(DtrujEvents, LinesFromAFifo)
 }
 
 } // namespace
+
+namespace {
+
+// A process that ends while still subscribed ends cleanly: the library
+// stops its thread on the way out.
+TEST(DtrujEventsExit, SubscribedAtExit)
+{
+    EXPECT_EXIT(
+        {
+            Lib lib;
+            lib.reset();
+            lib.sym<OLMA::evtProcessCBRetVoidFP>("registerEventProcessingCb")(onEvent);
+            lib.call("register_for_events", obj({{"dropOldEvents", true}}));
+            lib.inject("{}");
+            exit(0);
+        },
+        ::testing::ExitedWithCode(0), "");
+}
+
+} // namespace

@@ -63,29 +63,21 @@ TEST_F(DtrujState, PortAndAdapterSwitches)
     EXPECT_TRUE(isError(lib.call("setAdapterMode", obj({{"indexStr", FC_HBA}, {"adapterMode", "NIC"}}))));
 }
 
-TEST_F(DtrujState, AliasesTrunkingAndEthernetSettings)
+TEST_F(DtrujState, SettingsReachThePortTheyBelongTo)
 {
-    lib.call("setAdapterAlias", obj({{"type", "Node"}, {"wwn", FC_HBA}, {"alias", "rack7"}}));
-    lib.call("setPortAlias", obj({{"type", "Port"}, {"wwn", FC_PORT1}, {"alias", "fabric-b"}}));
-    EXPECT_EQ("rack7", lib.call("getHbaByWwn", obj({{"wwn", FC_HBA}}))["hbaData"]["alias"].asString());
-    EXPECT_EQ("fabric-b", port(FC_PORT1)["alias"].asString());
-    EXPECT_TRUE(isError(lib.call("setPortAlias", obj({{"wwn", FC_PORT1}}))));
-
     // An adapter address sets trunking on every port of the adapter.
     lib.call("setFcTrunkingState", obj({{"indexStr", FC_HBA}, {"enableState", true}}));
     EXPECT_TRUE(port(FC_PORT0)["trunkingEnabled"].asBool());
     EXPECT_TRUE(port(FC_PORT1)["trunkingEnabled"].asBool());
+    EXPECT_FALSE(port(FCOE_PORT)["trunkingEnabled"].asBool());
 
-    Json::Value mtu = obj({{"mac", ETH_PORT}, {"ethPort", obj({{"mtu", 1500}})}, {"propArray", strArray({"mtu"})}});
-    ASSERT_FALSE(isError(lib.call("setEthPort", mtu)));
-    EXPECT_EQ(1500u, lib.call("getEthPortByEthMac", obj({{"mac", ETH_PORT}}))["ethData"]["mtu"].asUInt());
-    mtu["ethPort"]["mtu"] = 100000;
-    EXPECT_TRUE(isError(lib.call("setEthPort", mtu)));
-
+    // The frame size set through the FC settings is the port's.
     lib.call("setFcByFcWwn", obj({{"portWwn", FC_PORT0}, {"fcPortData", obj({{"maxFrameSize", 1024}})},
                                   {"paramsConfigured", strArray({"maxFrameSize"})}}));
-    EXPECT_EQ(1024, lib.call("getFcByFcWwn", obj({{"wwn", FC_PORT0}}))["maxFrameSize"].asInt());
     EXPECT_EQ(1024, port(FC_PORT0)["maxFrameSize"].asInt());
+
+    Json::Value mtu = obj({{"mac", ETH_PORT}, {"ethPort", obj({{"mtu", 100000}})}, {"propArray", strArray({"mtu"})}});
+    EXPECT_TRUE(isError(lib.call("setEthPort", mtu)));
     EXPECT_TRUE(isError(lib.call("setFcoeByPort", obj({{"indexStr", FC_PORT0}, {"fcoePort", obj({})},
                                                        {"propArray", strArray({"vlanId"})}}))));
 }
