@@ -3,6 +3,7 @@
 #include "Lib.h"
 
 #include <map>
+#include <vector>
 #include <set>
 #include <unistd.h>
 
@@ -34,8 +35,24 @@ TEST_F(DtrujEntries, AllEntriesExportedAndNothingElse)
     EXPECT_EQ(nullptr, dlsym(lib.handle, "_ZN4OLMA3Sim5stateEv"));
 }
 
+std::vector<std::string> gLogLines;
+void onLog(int level, const char* file, int line, const char* text)
+{
+    gLogLines.push_back(std::to_string(level) + " " + file + ":" + std::to_string(line) + " " + text);
+    EXPECT_GE(level, 1);
+    EXPECT_LE(level, 4);
+}
+
 TEST_F(DtrujEntries, PlainEntriesAndLifecycle)
 {
+    lib.sym<OLMA::log4cxxMsgRetVoidFP>("registerLogMsgCb")(onLog);
+    lib.reset();
+    lib.call("getHbaByWwn", obj({{"wwn", "20:00:00:00:00:00:00:99"}}));
+    lib.sym<OLMA::log4cxxMsgRetVoidFP>("registerLogMsgCb")(nullptr);
+    ASSERT_GE(gLogLines.size(), 2u);
+    EXPECT_NE(std::string::npos, gLogLines.back().find("No such adapter")) << gLogLines.back();
+    EXPECT_NE(std::string::npos, gLogLines.back().find(".cpp:")) << gLogLines.back();
+
     auto version = lib.sym<OLMA::voidRetStrFP>("get_agt_version");
     ASSERT_NE(nullptr, version());
     EXPECT_STREQ("3.2.1", version());
