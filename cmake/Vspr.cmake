@@ -25,7 +25,14 @@ function(vspr_tests)
     set(exe ${ARG_PREFIX}${base})
     add_executable(${exe} ${src})
     target_link_libraries(${exe} PRIVATE ${ARG_LIBS} GTest::gtest GTest::gtest_main Threads::Threads)
-    gtest_discover_tests(${exe} DISCOVERY_TIMEOUT 60
-      PROPERTIES ENVIRONMENT "VSPR_BUILD_DIR=${CMAKE_BINARY_DIR};VSPR_SOURCE_DIR=${CMAKE_SOURCE_DIR}" ${ARG_PROPERTIES})
+    # The tree's locations as compile definitions: a list-valued ENVIRONMENT
+    # property would be split apart by gtest_discover_tests.
+    target_compile_definitions(${exe} PRIVATE
+      VSPR_BUILD_DIR="${CMAKE_BINARY_DIR}" VSPR_SOURCE_DIR="${CMAKE_SOURCE_DIR}")
+    if(ARG_PROPERTIES)
+      gtest_discover_tests(${exe} DISCOVERY_TIMEOUT 60 PROPERTIES ${ARG_PROPERTIES})
+    else()
+      gtest_discover_tests(${exe} DISCOVERY_TIMEOUT 60)
+    endif()
   endforeach()
 endfunction()

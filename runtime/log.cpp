@@ -19,7 +19,8 @@ const char* const _log_level_strings[5] = { "FATAL", "ERR", "WARN", "INFO", "DBG
 
 bool _log_enabled_state = true;
 
-String tessel_home_envvar("HOME");
+static const char _HOME_VAR[] = "HOME";
+String tessel_home_envvar(_HOME_VAR);
 
 static const char _TESSEL_DIR[] = ".tessel";
 static const size_t _PATH_SIZE = 1024;
@@ -108,8 +109,10 @@ static int _read_config(const char* path, Log_Level& level)
 // failure leaves everything closed so that the next message tries again.
 static void _open()
 {
-    const char* var = tessel_home_envvar.size() ? tessel_home_envvar.c_str() : "HOME";
-    const char* home = getenv(var);
+    // The literal, not tessel_home_envvar: a static constructor elsewhere in
+    // the module (the adapter library's start-up) may log before that String
+    // has been constructed.
+    const char* home = getenv(_HOME_VAR);
 
     if (!home)
         return;
