@@ -67,7 +67,16 @@ Json::Value call(const char* entry, const Json::Value& req, Handler h)
     if (!s.initialised)
         return errorReply(1, std::string(entry) + ": the adapter library is not initialised");
     SIMLOG(SL_DEBUG, "enter %s", entry);
-    return h(s, req);
+    if (!req.isNull() && !req.isObject())
+        return errorReply(3, std::string(entry) + ": the request is not a JSON object");
+    // A member of an unexpected type, in the request or in a hand-written
+    // host description, makes JsonCpp throw; the caller gets an error reply
+    // naming the entry instead.
+    try {
+        return h(s, req);
+    } catch (const Json::Exception& e) {
+        return errorReply(3, std::string(entry) + ": malformed value: " + e.what());
+    }
 }
 
 Json::Value notFound(const char* what, const std::string& addr)
@@ -458,7 +467,7 @@ DTRUJ_API Json::Value init_hba_lib(const Json::Value& req)
         return r;
     }
     s.initialised = true;
-    SIMLOG(SL_INFO, "initialised for application %d", req.isObject() ? req.get("appId", 0).asInt() : 0);
+    SIMLOG(SL_INFO, "initialised for application %d", req.isObject() && req["appId"].isInt() ? req["appId"].asInt() : 0);
     r["result"] = 0;
     r["message"] = "Success";
     return r;
@@ -1819,7 +1828,13 @@ Json::Value runDirect(const char* entry, const Json::Value& req,
         std::lock_guard<std::mutex> g(s.mtx);
         if (!s.initialised)
             return errorReply(1, std::string(entry) + ": the adapter library is not initialised");
-        reply = prepare(s, req, delay);
+        if (!req.isNull() && !req.isObject())
+            return errorReply(3, std::string(entry) + ": the request is not a JSON object");
+        try {
+            reply = prepare(s, req, delay);
+        } catch (const Json::Exception& e) {
+            return errorReply(3, std::string(entry) + ": malformed value: " + e.what());
+        }
     }
     sleepMs(delay);
     return reply;

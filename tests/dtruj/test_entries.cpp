@@ -2,6 +2,7 @@
 // that the module reads.
 #include "Lib.h"
 
+#include <cstring>
 #include <map>
 #include <vector>
 #include <set>
@@ -409,6 +410,43 @@ TEST_F(DtrujEntries, EveryJsonEntryAnswers)
     // and have tests of their own: diagLoopbackTest, diagEthLoopbackTest,
     // diagMemoryTest, adapterUpdateFlash.
     EXPECT_EQ(107u, seen.size());
+}
+
+// Requests of the wrong shape, or with members of the wrong type, answer an
+// error and never throw: the library is driven by consoles too.
+TEST_F(DtrujEntries, MalformedRequestsNeverThrow)
+{
+    Json::Reader reader;
+    Json::Value wrongTypes;
+    ASSERT_TRUE(reader.parse(R"({"wwn": 5, "mac": [], "indexStr": {}, "pPortWwn": true, "portWwn": 1.5,
+        "hbaWwn": null, "requestID": 7, "function": [], "enableState": "yes", "state": "on",
+        "stopOnError": "x", "dropOldEvents": "x", "frameCount": -4, "port": 5, "propArray": "portStatus",
+        "vportArray": [[1]], "pciFunctionIndices": [{}], "vNICs": [5], "addedLunMaskData": [5],
+        "removedLunMaskData": {}, "clearLunMaskData": "x", "addedAdvancedIoProfiles": [{"lunId": -3}],
+        "minBandwidth": "x", "maxBandwidth": 1e30, "adapterMode": 3, "file": 9, "alias": 4,
+        "portAuth": [], "fcPortData": 3, "paramsConfigured": [3]})", wrongTypes));
+    // Real WWNs with wrong-typed companions reach deeper into each entry.
+    Json::Value deeper = wrongTypes;
+    for (const char* m : {"wwn", "indexStr", "pPortWwn", "pwwn", "portWwn"})
+        deeper[m] = FC_PORT0;
+    deeper["mac"] = ETH_PORT;
+    deeper["hbaWwn"] = FC_HBA;
+    deeper["lPortWwn"] = FC_PORT0;
+    deeper["rPortWwn"] = DISK_RPORT;
+    std::vector<Json::Value> requests = {Json::Value(Json::arrayValue), Json::Value("text"), Json::Value(3),
+                                         Json::Value(Json::objectValue), wrongTypes, deeper};
+    requests[0].append(1);
+    for (const char* e : entryNames) {
+        if (!strcmp(e, "init_hba_lib") || !strcmp(e, "free_hba_lib") || !strcmp(e, "getRequestID")
+            || !strcmp(e, "getNumberOfAdapters") || !strcmp(e, "get_agt_version")
+            || !strcmp(e, "registerEventProcessingCb") || !strcmp(e, "registerLogMsgCb"))
+            continue;
+        for (const Json::Value& r : requests)
+            EXPECT_NO_THROW(lib.call(e, r)) << e << " " << r.toStyledString();
+    }
+    lib.call("unregister_for_events");
+    // The library still answers afterwards.
+    EXPECT_EQ(2u, lib.call("getAllAdaptersIndexString")["indexStrings"].size());
 }
 
 } // namespace
