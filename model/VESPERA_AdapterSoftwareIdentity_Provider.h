@@ -7,8 +7,7 @@
 namespace OLMA
 {
 
-// Serves VESPERA_AdapterSoftwareIdentity. Until its data source is wired it has no instances and
-// supports no other operation.
+// Serves VESPERA_AdapterSoftwareIdentity: enumeration only, from FCHBAManager.
 class VESPERA_AdapterSoftwareIdentity_Provider
 {
 public:

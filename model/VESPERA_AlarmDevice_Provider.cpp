@@ -1,4 +1,7 @@
 #include "VESPERA_AlarmDevice_Provider.h"
+
+#include "FCHBAManager.h"
+#include "InstanceDelivery.h"
 #include "log.h"
 
 namespace OLMA
@@ -28,9 +31,23 @@ Get_Instance_Status VESPERA_AlarmDevice_Provider::get_instance(const VESPERA_Ala
 }
 
 Enum_Instances_Status VESPERA_AlarmDevice_Provider::enum_instances(
-    const VESPERA_AlarmDevice*, Enum_Instances_Handler<VESPERA_AlarmDevice>*)
+    const VESPERA_AlarmDevice*, Enum_Instances_Handler<VESPERA_AlarmDevice>* handler)
 {
     TLOG(LL_DBG, "Entering: %s", "enum_instances");
+
+    Array<Instance*> instances =
+        FCHBAManager::getFCHBAManager()->getInstances(ID_VESPERA_AlarmDevice);
+
+    if (instances.size() == 0)
+    {
+        TLOG(LL_ERR, "Invalid number of Instances returned");
+        TLOG(LL_DBG, "Returning: %s", "enum_instances");
+        return ENUM_INSTANCES_OK;
+    }
+
+    TLOG(LL_DBG, "Returning instances");
+    deliverInstances(instances, handler);
+
     TLOG(LL_DBG, "Returning: %s", "enum_instances");
     return ENUM_INSTANCES_OK;
 }

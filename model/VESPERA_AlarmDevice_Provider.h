@@ -8,8 +8,7 @@
 namespace OLMA
 {
 
-// Serves VESPERA_AlarmDevice. Until its data source is wired it has no instances and
-// supports no other operation.
+// Serves VESPERA_AlarmDevice: enumeration only, from FCHBAManager.
 class VESPERA_AlarmDevice_Provider
 {
 public:

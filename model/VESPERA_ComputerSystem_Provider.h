@@ -8,8 +8,7 @@
 namespace OLMA
 {
 
-// Serves VESPERA_ComputerSystem. Until its data source is wired it has no instances and
-// supports no other operation.
+// Serves VESPERA_ComputerSystem: enumeration only, from FCHBAManager.
 class VESPERA_ComputerSystem_Provider
 {
 public:

@@ -8,8 +8,7 @@
 namespace OLMA
 {
 
-// Serves VESPERA_EthernetPort. Until its data source is wired it has no instances and
-// supports no other operation.
+// Serves VESPERA_EthernetPort: enumeration only, from FCHBAManager.
 class VESPERA_EthernetPort_Provider
 {
 public:

@@ -7,8 +7,7 @@
 namespace OLMA
 {
 
-// Serves VESPERA_FCPortStatistics. Until its data source is wired it has no instances and
-// supports no other operation.
+// Serves VESPERA_FCPortStatistics: enumeration only, from FCHBAManager.
 class VESPERA_FCPortStatistics_Provider
 {
 public:

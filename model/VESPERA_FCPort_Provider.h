@@ -8,8 +8,7 @@
 namespace OLMA
 {
 
-// Serves VESPERA_FCPort. Until its data source is wired it has no instances and
-// supports no other operation.
+// Serves VESPERA_FCPort: enumeration only, from FCHBAManager.
 class VESPERA_FCPort_Provider
 {
 public:

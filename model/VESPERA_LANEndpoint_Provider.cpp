@@ -1,4 +1,7 @@
 #include "VESPERA_LANEndpoint_Provider.h"
+
+#include "FCHBAManager.h"
+#include "InstanceDelivery.h"
 #include "log.h"
 
 namespace OLMA
@@ -28,9 +31,23 @@ Get_Instance_Status VESPERA_LANEndpoint_Provider::get_instance(const VESPERA_LAN
 }
 
 Enum_Instances_Status VESPERA_LANEndpoint_Provider::enum_instances(
-    const VESPERA_LANEndpoint*, Enum_Instances_Handler<VESPERA_LANEndpoint>*)
+    const VESPERA_LANEndpoint*, Enum_Instances_Handler<VESPERA_LANEndpoint>* handler)
 {
     TLOG(LL_DBG, "Entering: %s", "enum_instances");
+
+    Array<Instance*> instances =
+        FCHBAManager::getFCHBAManager()->getInstances(ID_VESPERA_LANEndpoint);
+
+    if (instances.size() == 0)
+    {
+        TLOG(LL_WARN, "No Ethernet Port Found");
+        TLOG(LL_DBG, "Returning: %s", "enum_instances");
+        return ENUM_INSTANCES_OK;
+    }
+
+    TLOG(LL_DBG, "Returning instances");
+    deliverInstances(instances, handler);
+
     TLOG(LL_DBG, "Returning: %s", "enum_instances");
     return ENUM_INSTANCES_OK;
 }

@@ -8,8 +8,7 @@
 namespace OLMA
 {
 
-// Serves VESPERA_LANEndpoint. Until its data source is wired it has no instances and
-// supports no other operation.
+// Serves VESPERA_LANEndpoint: enumeration only, from FCHBAManager.
 class VESPERA_LANEndpoint_Provider
 {
 public:

@@ -8,8 +8,7 @@
 namespace OLMA
 {
 
-// Serves VESPERA_LogicalDisk. Until its data source is wired it has no instances and
-// supports no other operation.
+// Serves VESPERA_LogicalDisk: enumeration only, from HDRManager.
 class VESPERA_LogicalDisk_Provider
 {
 public:

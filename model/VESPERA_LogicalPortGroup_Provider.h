@@ -7,8 +7,7 @@
 namespace OLMA
 {
 
-// Serves VESPERA_LogicalPortGroup. Until its data source is wired it has no instances and
-// supports no other operation.
+// Serves VESPERA_LogicalPortGroup: enumeration only, from FCHBAManager.
 class VESPERA_LogicalPortGroup_Provider
 {
 public:

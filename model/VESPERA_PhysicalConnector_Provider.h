@@ -7,8 +7,7 @@
 namespace OLMA
 {
 
-// Serves VESPERA_PhysicalConnector. Until its data source is wired it has no instances and
-// supports no other operation.
+// Serves VESPERA_PhysicalConnector: enumeration only, from FCHBAManager.
 class VESPERA_PhysicalConnector_Provider
 {
 public:

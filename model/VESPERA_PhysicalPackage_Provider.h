@@ -8,8 +8,7 @@
 namespace OLMA
 {
 
-// Serves VESPERA_PhysicalPackage. Until its data source is wired it has no instances and
-// supports no other operation.
+// Serves VESPERA_PhysicalPackage: enumeration only, from FCHBAManager.
 class VESPERA_PhysicalPackage_Provider
 {
 public:

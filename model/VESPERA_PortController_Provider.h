@@ -8,8 +8,7 @@
 namespace OLMA
 {
 
-// Serves VESPERA_PortController. Until its data source is wired it has no instances and
-// supports no other operation.
+// Serves VESPERA_PortController: enumeration only, from FCHBAManager.
 class VESPERA_PortController_Provider
 {
 public:

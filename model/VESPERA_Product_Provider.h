@@ -7,8 +7,7 @@
 namespace OLMA
 {
 
-// Serves VESPERA_Product. Until its data source is wired it has no instances and
-// supports no other operation.
+// Serves VESPERA_Product: enumeration only, from FCHBAManager.
 class VESPERA_Product_Provider
 {
 public:

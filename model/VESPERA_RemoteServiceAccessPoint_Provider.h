@@ -8,8 +8,7 @@
 namespace OLMA
 {
 
-// Serves VESPERA_RemoteServiceAccessPoint. Until its data source is wired it has no instances and
-// supports no other operation.
+// Serves VESPERA_RemoteServiceAccessPoint: enumeration only, from FCHBAManager.
 class VESPERA_RemoteServiceAccessPoint_Provider
 {
 public:

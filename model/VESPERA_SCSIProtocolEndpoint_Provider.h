@@ -8,8 +8,7 @@
 namespace OLMA
 {
 
-// Serves VESPERA_SCSIProtocolEndpoint. Until its data source is wired it has no instances and
-// supports no other operation.
+// Serves VESPERA_SCSIProtocolEndpoint: enumeration only, from FCHBAManager.
 class VESPERA_SCSIProtocolEndpoint_Provider
 {
 public:

@@ -8,8 +8,7 @@
 namespace OLMA
 {
 
-// Serves VESPERA_StorageExtent. Until its data source is wired it has no instances and
-// supports no other operation.
+// Serves VESPERA_StorageExtent: enumeration only, from HDRManager.
 class VESPERA_StorageExtent_Provider
 {
 public:

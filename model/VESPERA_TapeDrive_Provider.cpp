@@ -1,4 +1,7 @@
 #include "VESPERA_TapeDrive_Provider.h"
+
+#include "HDRManager.h"
+#include "InstanceDelivery.h"
 #include "log.h"
 
 namespace OLMA
@@ -28,9 +31,23 @@ Get_Instance_Status VESPERA_TapeDrive_Provider::get_instance(const VESPERA_TapeD
 }
 
 Enum_Instances_Status VESPERA_TapeDrive_Provider::enum_instances(
-    const VESPERA_TapeDrive*, Enum_Instances_Handler<VESPERA_TapeDrive>*)
+    const VESPERA_TapeDrive*, Enum_Instances_Handler<VESPERA_TapeDrive>* handler)
 {
     TLOG(LL_DBG, "Entering: %s", "enum_instances");
+
+    Array<Instance*> instances =
+        HDRManager::getHDRManager()->getInstances(ID_VESPERA_TapeDrive);
+
+    if (instances.size() == 0)
+    {
+        TLOG(LL_ERR, "No TapeDrives Found!");
+        TLOG(LL_DBG, "Returning: %s", "enum_instances");
+        return ENUM_INSTANCES_OK;
+    }
+
+    TLOG(LL_DBG, "Returning instances");
+    deliverInstances(instances, handler);
+
     TLOG(LL_DBG, "Returning: %s", "enum_instances");
     return ENUM_INSTANCES_OK;
 }

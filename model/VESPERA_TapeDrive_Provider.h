@@ -8,8 +8,7 @@
 namespace OLMA
 {
 
-// Serves VESPERA_TapeDrive. Until its data source is wired it has no instances and
-// supports no other operation.
+// Serves VESPERA_TapeDrive: enumeration only, from HDRManager.
 class VESPERA_TapeDrive_Provider
 {
 public:
