@@ -16,9 +16,11 @@ protected:
     {
         // Whatever the adapter made through the broker, it released or left
         // to the operation's scope.
-        EXPECT_EQ(0u, host->live_objects());
+        EXPECT_EQ(expected_live, host->live_objects());
         Tst_Host::TearDown();
     }
+
+    size_t expected_live = 0;
 };
 
 TEST_F(Adapter, EnumerateInstancesCarriesEveryTypeAndBothReferenceForms)
@@ -271,6 +273,54 @@ TEST_F(Adapter, InvokeMethodWithoutArgumentsLeavesParametersNull)
     ASSERT_TRUE(r.ok()) << r.message;
     EXPECT_STREQ("(null)", state->text);
     EXPECT_EQ(1000u, state->lines);
+}
+
+// A provider reaches the server from inside a request: its own class again
+// (through the recursive lock), and from a thread of its own.
+TEST_F(Adapter, ProvidersCallBackIntoTheServer)
+{
+    state->count = 3;
+
+    struct { const char* text; uint32 count; } rows[] =
+    {
+        { "enum", 3 },
+        { "get", 201 },
+        { "thread", 1 },
+    };
+
+    for (const auto& row : rows)
+    {
+        std::vector<ch::Property> in = { ch::Property { "Text", ch::Value::of_string(row.text) } };
+        ch::Result r = host->cm(path("p", 1), "Frob", in);
+        ASSERT_TRUE(r.ok()) << row.text << ": " << r.message;
+        bool found = false;
+        for (const ch::Property& p : r.out)
+        {
+            if (p.name == "Count")
+            {
+                found = true;
+                EXPECT_EQ(row.count, p.value.num.uint32) << row.text;
+            }
+        }
+        EXPECT_TRUE(found) << row.text;
+    }
+
+    // The context prepared for the provider's thread lives in the server's
+    // own scope; the server frees it when it unloads.
+    expected_live = 1;
+
+    // No instances: the enumerator is false at once.
+    state->count = 0;
+    std::vector<ch::Property> in = { ch::Property { "Text", ch::Value::of_string("enum") } };
+    ch::Result r = host->cm(path("p", 1), "Frob", in);
+    ASSERT_TRUE(r.ok());
+    for (const ch::Property& p : r.out)
+    {
+        if (p.name == "Count")
+        {
+            EXPECT_EQ(0u, p.value.num.uint32);
+        }
+    }
 }
 
 TEST_F(Adapter, UnknownMethodIsNotFound)

@@ -10,6 +10,7 @@
 #include "Dispatch.h"
 #include "CMPI_Adapter.h"
 #include "cimom.h"
+#include "Thread.h"
 
 namespace OLMA
 {
@@ -38,6 +39,60 @@ static void _observe(const char* op, const TST_Part* x)
             !__null_of(x, (const Meta_Property*)mf))
             _state.non_null++;
     }
+}
+
+// On a thread the provider starts: the server through the thread's own
+// attached context. (Not this provider: the request that waits for the
+// thread holds its lock.)
+static void* _thread_proc(void*)
+{
+    String user;
+    _state.thread_user_ok = cimom::get_username(user) && user == "cimhost";
+    return 0;
+}
+
+// Frob's text picks a round trip through the server, for the context
+// tests; the count says what came back.
+static uint32 _through_server(const String& what, bool& handled)
+{
+    handled = true;
+
+    if (what == "enum")
+    {
+        Ref<TST_Part> model(tst_make_key("", 0));
+        Instance_Enumerator e;
+        if (cimom::enum_instances("root/test", model.ptr(), e) != 0)
+            return 1000;
+        uint32 n = 0;
+        for (; e; e++)
+        {
+            Ref<Instance> i = e();
+            if (i && checked_cast<TST_Part>(i.ptr()))
+                n++;
+        }
+        return n;
+    }
+
+    if (what == "get")
+    {
+        Ref<TST_Part> model(tst_make_key("part1", 1));
+        Ref<Instance> i = cimom::get_instance("root/test", model.ptr());
+        TST_Part* p = checked_cast<TST_Part>(i.ptr());
+        return p ? p->U8.value : 1000;
+    }
+
+    if (what == "thread")
+    {
+        Thread t;
+        if (Thread::create_joinable(t, _thread_proc, 0) != 0)
+            return 1000;
+        void* rv;
+        Thread::join(t, rv);
+        return _state.thread_user_ok ? 1 : 0;
+    }
+
+    handled = false;
+    return 0;
 }
 
 class TST_Part_Provider
@@ -136,7 +191,9 @@ public:
         _state.user_ok = cimom::get_username(user);
         snprintf(_state.user, sizeof(_state.user), "%s", user.c_str());
 
-        Count.set(_state.lines * 2);
+        bool handled = false;
+        uint32 through = Text.null ? 0 : _through_server(Text.value, handled);
+        Count.set(handled ? through : _state.lines * 2);
         Made = tst_make_key("made", 9);
         return_value.set(7);
         return Invoke_Method_Status(_state.invoke_status);

@@ -44,6 +44,7 @@ struct Tst_State
     unsigned lines;
     bool user_ok;
     char user[64];
+    bool thread_user_ok;
 };
 
 } // namespace OLMA
