@@ -1,0 +1,172 @@
+#ifndef _VSPR_PortHelper_h
+#define _VSPR_PortHelper_h
+
+#include <json/json.h>
+
+#include "config.h"
+#include "Array.h"
+#include "Instance.h"
+#include "String.h"
+#include "ProviderTypes.h"
+
+namespace OLMA
+{
+
+class TargetHelper;
+
+// One physical FC port as read from getPortByWwn. Addresses are in plain
+// form. Zeroed for each port and handed by value to the builders, so a
+// builder can never see a half-filled text of another port.
+struct _hbaPortInfo
+{
+    char portWwn[24];
+    char nodeWwn[24];
+    char symbolicName[1028];
+    int state;
+    char hostName[256];
+    uint16 portType;
+    uint64 maxFrameSize;
+    uint64 speed;       // bit/s; 0 when the port reports no speed
+    uint64 maxSpeed;    // bit/s
+    uint16 portNumber;  // place in the adapter's port list, from 0
+
+    // The remote port of a target endpoint (plain form). The endpoint's name
+    // is longer than portWwn can hold, so the builder composes it from both.
+    char rPortWwn[24];
+};
+
+// Counters of getDynamicPortStatistics for one port. FC ports and FCoE ports
+// report different ids, hence two groups.
+struct prov_pport_stats_s
+{
+    // FC port
+    uint64 txFrames;
+    uint64 txWords;
+    uint64 rxFrames;
+    uint64 rxWords;
+    uint64 lipCount;
+    uint64 nosCount;
+    uint64 crcErrors;
+    uint64 errorFrames;
+    uint64 dumpedFrames;
+    uint64 linkFailures;
+    uint64 lossOfSync;
+    uint64 lossOfSignal;
+    uint64 primitiveSeqErrors;
+    uint64 invalidTxWords;
+
+    // FCoE port
+    uint64 fcoeError1;
+    uint64 fcoeCrcErrors;
+    uint64 fcoeDumpedFrames;
+    uint64 fcoeError2;
+    uint64 fcoeError3;
+    uint64 fcoeError4;
+
+    // FCoE traffic comes by unicast, multicast and broadcast.
+    uint64 fcoeTxUcastFrames;
+    uint64 fcoeTxMcastFrames;
+    uint64 fcoeTxBcastFrames;
+    uint64 fcoeTxUcastBytes;
+    uint64 fcoeTxMcastBytes;
+    uint64 fcoeTxBcastBytes;
+    uint64 fcoeRxUcastFrames;
+    uint64 fcoeRxMcastFrames;
+    uint64 fcoeRxBcastFrames;
+    uint64 fcoeRxUcastBytes;
+    uint64 fcoeRxMcastBytes;
+    uint64 fcoeRxBcastBytes;
+};
+
+// Builds the instances of the physical FC ports: VESPERA_FCPort,
+// VESPERA_SCSIProtocolEndpoint, VESPERA_FCPortStatistics,
+// VESPERA_LogicalPortGroup and VESPERA_AlarmDevice, and walks the ports on
+// behalf of TargetHelper for the storage extents, tape drives and logical
+// disks behind them. It also switches a port's beacon.
+//
+// Arrays hold new instances that the caller owns. A port or adapter that
+// can't be read is left out after an ERR line; nothing here throws.
+class PortHelper
+{
+public:
+
+    PortHelper();
+
+    static PortHelper* getPortHelperObject();
+
+    // All adapters, in the library's order.
+    Array<Instance*> getInstancesByClass(classId_t id);
+
+    // The adapter at place adapterId (from 1) of "indexStrings" of adapters,
+    // a reply of getAllAdaptersIndexString.
+    Array<Instance*> getInstancesByAdapterId(int adapterId, classId_t id,
+        Json::Value adapters);
+
+    // The adapter named by address (colon or plain form). Serves 3, 4, 5, 9,
+    // 16, 30 and 36.
+    Array<Instance*> getInstancesByAdapterAddress(String address, classId_t id);
+
+    Array<Instance*> getFCPortInstancesByAdapter(String address);
+
+    // getPortByWwn of a port (WWN, or a 12-digit MAC); 0 or -1.
+    int getPortDetails(String index, Json::Value& reply);
+
+    // True only if the port reports itself disabled; a port that can't be
+    // read counts as enabled.
+    bool isPortDisabled(String index);
+
+    // The number of FC ports of an adapter, whose list stays in reply; -1
+    // if it can't be had.
+    int getNumberOfPorts(String index, Json::Value& reply);
+
+    // getOpticsSFP of a port; 0 or -1.
+    int getOpticsInfo(String index, Json::Value& reply);
+
+    // Switches the beacon of the port whose DeviceID is deviceId: on for
+    // state 3, off for any other. Returns 1 when switched, 2 for a
+    // mezzanine card (no beacon), 3 when it already was so, 0 on failure.
+    int setAlarmState(String deviceId, int state);
+
+    Instance* getFCPortInstance(_hbaPortInfo port);
+    Instance* getLogicalPortGroupInstance(_hbaPortInfo port);
+    Instance* getFCPortStatisticsInstance(_hbaPortInfo port,
+        prov_pport_stats_s stats, bool isFCoE);
+    Instance* getSCSIProtocolEndpointInstance(_hbaPortInfo port, bool isInitiator);
+    Instance* getAlarmDeviceInstance(_hbaPortInfo port, bool beaconOn);
+
+    // CIM EnabledState of a port state ("portStatusValue" and the like).
+    static uint16 getEnabledState(int state);
+
+    // Reads the members of a getPortByWwn reply into a zeroed record. The
+    // reply is untrusted: missing or mistyped members leave their fields
+    // zero, and over-long texts are cut to their field.
+    static void fillPortInfo(const Json::Value& reply, const String& index,
+        uint16 portNumber, _hbaPortInfo& port);
+
+    // Reads a getDynamicPortStatistics reply into a zeroed record.
+    static void fillPortStatistics(const Json::Value& reply, bool isFCoE,
+        prov_pport_stats_s& stats);
+
+    static PortHelper* helperObj;
+
+private:
+
+    PortHelper(const PortHelper&);
+    PortHelper& operator=(const PortHelper&);
+
+    bool _walkAdapter(const String& index, classId_t id, bool byAddress,
+        Array<Instance*>& result);
+    void _buildForPort(const String& portIndex, const Json::Value& reply,
+        const _hbaPortInfo& port, classId_t id, Array<Instance*>& result);
+    void _addTargetEndpoints(const _hbaPortInfo& port, Array<Instance*>& result);
+    void _addStatistics(const String& portIndex, const Json::Value& reply,
+        const _hbaPortInfo& port, Array<Instance*>& result);
+
+    TargetHelper* _targetHelper;
+};
+
+extern PortHelper gPortHelperObj;
+
+} // namespace OLMA
+
+#endif
