@@ -1,5 +1,9 @@
 #include "FCHBAManager.h"
 
+#include "AdapterHelper.h"
+#include "CommonHelper.h"
+#include "EthernetPortHelper.h"
+#include "PortHelper.h"
 #include "ProviderUtil.h"
 #include "log.h"
 
@@ -9,7 +13,17 @@ namespace OLMA
 FCHBAManager gFCHBAManagerObj;
 FCHBAManager* FCHBAManager::helperObj = 0;
 
-FCHBAManager::FCHBAManager()
+// Only the pointers are taken here: a helper's own object may not be built
+// yet, and nothing is asked of it before static initialisation is over.
+FCHBAManager::FCHBAManager() :
+    adapterHelper(AdapterHelper::getAdapterHelperInstance()),
+    portHelper(PortHelper::getPortHelperObject()),
+    commonHelper(CommonHelper::getCommonHelperObject()),
+    accessPointHelper(0),
+    softwareUpdateHelper(0),
+    ethernetPortHelper(EthernetPortHelper::getEthernetPortHelperObject()),
+    diagnosticHelper(0),
+    physicalAssetHelper(0)
 {
 }
 
@@ -25,51 +39,44 @@ FCHBAManager* FCHBAManager::getFCHBAManager()
 // INVENTORY DISPATCH
 //
 // The one place where a class id meets the helper that builds its
-// instances. The inventory helpers (AdapterHelper, PortHelper, CommonHelper,
-// AccessPointHelper, SoftwareUpdateHelper, EthernetPortHelper,
-// DiagnosticHelper, PhysicalAssetHelper) aren't part of the module yet;
-// each case names its helper and answers with no instances until that helper
-// is wired in here. The driver status has been checked by the caller.
+// instances. The driver status has been checked by the caller. The software
+// update, diagnostic, access point and physical asset helpers aren't part of
+// the module yet: their classes answer with no instances until they are
+// wired in here.
 //------------------------------------------------------------------------------
 
-static Array<Instance*> _serve(classId_t id)
+Array<Instance*> FCHBAManager::_serve(classId_t id)
 {
-    Array<Instance*> result;
-
     switch (id)
     {
         case ID_VESPERA_ComputerSystem:
-            // CommonHelper: the host.
-            break;
+            return commonHelper->getComputerSystemInstances(id);
 
         case ID_VESPERA_PortController:
         case ID_VESPERA_PhysicalPackage:
         case ID_VESPERA_Product:
         case ID_VESPERA_AdapterSoftwareIdentity:
-            // AdapterHelper
-            break;
+            return adapterHelper->getInstancesByClass(id);
 
         case ID_VESPERA_FCPort:
         case ID_VESPERA_SCSIProtocolEndpoint:
         case ID_VESPERA_FCPortStatistics:
         case ID_VESPERA_LogicalPortGroup:
         case ID_VESPERA_AlarmDevice:
-            // PortHelper
-            break;
+            return portHelper->getInstancesByClass(id);
 
         case ID_VESPERA_RemoteServiceAccessPoint:
             // AccessPointHelper
-            break;
+            return Array<Instance*>();
 
         case ID_VESPERA_HBASoftwareInstallationService:
         case ID_VESPERA_HBASoftwareInstallationServiceCapabilities:
             // SoftwareUpdateHelper
-            break;
+            return Array<Instance*>();
 
         case ID_VESPERA_EthernetPort:
         case ID_VESPERA_LANEndpoint:
-            // EthernetPortHelper
-            break;
+            return ethernetPortHelper->getInstancesByClass(id);
 
         case ID_VESPERA_MemoryDiagnosticTest:
         case ID_VESPERA_LoopbackDiagnosticTest:
@@ -83,31 +90,15 @@ static Array<Instance*> _serve(classId_t id)
         case ID_VESPERA_ServiceRecordAppliesToElement:
         case ID_VESPERA_CompletionRecordAppliesToElement:
             // DiagnosticHelper
-            break;
+            return Array<Instance*>();
 
         case ID_VESPERA_PhysicalConnector:
             // PhysicalAssetHelper
-            break;
+            return Array<Instance*>();
 
         default:
-            break;
+            return Array<Instance*>();
     }
-
-    return result;
-}
-
-static Array<Instance*> _fcPortsOf(const String& address)
-{
-    // PortHelper::getFCPortInstancesByAdapter(address)
-    (void)address;
-    return Array<Instance*>();
-}
-
-static Array<Instance*> _ethernetPortsOf(const String& address)
-{
-    // EthernetPortHelper::getEthernetPortInstancesByAdapter(address)
-    (void)address;
-    return Array<Instance*>();
 }
 
 static Array<Instance*> _diagnosticServices()
@@ -175,13 +166,13 @@ Array<Instance*> FCHBAManager::getInstances(classId_t id)
 
 Array<Instance*> FCHBAManager::getFCPortInstancesByAdapter(String address)
 {
-    return _fcPortsOf(address);
+    return portHelper->getFCPortInstancesByAdapter(address);
 }
 
 Array<Instance*> FCHBAManager::getEthernetPortInstancesByAdapter(
     String address)
 {
-    return _ethernetPortsOf(address);
+    return ethernetPortHelper->getEthernetPortInstancesByAdapter(address);
 }
 
 Array<Instance*> FCHBAManager::getAllDiagnosticTestInstances()

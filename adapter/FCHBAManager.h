@@ -9,6 +9,15 @@
 namespace OLMA
 {
 
+class AdapterHelper;
+class PortHelper;
+class CommonHelper;
+class AccessPointHelper;
+class SoftwareUpdateHelper;
+class EthernetPortHelper;
+class DiagnosticHelper;
+class PhysicalAssetHelper;
+
 // The facade through which providers ask for the instances of adapters,
 // ports and everything that belongs to them, by class id. It checks the
 // driver status and hands the request to the helper that owns the class.
@@ -33,7 +42,21 @@ public:
 
     static FCHBAManager* helperObj;
 
+    // The helper singletons, set by the constructor. A helper that isn't
+    // part of the module yet stays null, and its classes answer with no
+    // instances.
+    AdapterHelper* adapterHelper;
+    PortHelper* portHelper;
+    CommonHelper* commonHelper;
+    AccessPointHelper* accessPointHelper;
+    SoftwareUpdateHelper* softwareUpdateHelper;
+    EthernetPortHelper* ethernetPortHelper;
+    DiagnosticHelper* diagnosticHelper;
+    PhysicalAssetHelper* physicalAssetHelper;
+
 private:
+
+    Array<Instance*> _serve(classId_t id);
 
     FCHBAManager(const FCHBAManager&);
     FCHBAManager& operator=(const FCHBAManager&);

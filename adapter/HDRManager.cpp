@@ -1,5 +1,6 @@
 #include "HDRManager.h"
 
+#include "PortHelper.h"
 #include "ProviderUtil.h"
 #include "log.h"
 
@@ -9,7 +10,9 @@ namespace OLMA
 HDRManager gHDRManagerObj;
 HDRManager* HDRManager::helperObj = 0;
 
-HDRManager::HDRManager()
+// Only the pointer is taken: the helper's object may not be built yet.
+HDRManager::HDRManager() :
+    portHelper(PortHelper::getPortHelperObject())
 {
 }
 
@@ -19,15 +22,6 @@ HDRManager* HDRManager::getHDRManager()
         helperObj = &gHDRManagerObj;
 
     return helperObj;
-}
-
-// INVENTORY DISPATCH: PortHelper::getInstancesByClass(id) walks the adapters
-// and ports and asks TargetHelper for what lies behind each port. Until
-// PortHelper is part of the module, the targets answer with no instances.
-static Array<Instance*> _targetsOfClass(classId_t id)
-{
-    (void)id;
-    return Array<Instance*>();
 }
 
 Array<Instance*> HDRManager::getInstances(classId_t id)
@@ -50,7 +44,9 @@ Array<Instance*> HDRManager::getInstances(classId_t id)
         return Array<Instance*>();
     }
 
-    return _targetsOfClass(id);
+    // INVENTORY DISPATCH: the same walk of adapters and ports as for the
+    // ports themselves, which asks TargetHelper for what lies behind each.
+    return portHelper->getInstancesByClass(id);
 }
 
 } // namespace OLMA

@@ -8,6 +8,8 @@
 namespace OLMA
 {
 
+class PortHelper;
+
 // The facade for host discovered resources: the storage extents, tape
 // drives and logical disks behind the FC ports. The caller owns the
 // instances of the returned array.
@@ -22,6 +24,9 @@ public:
     Array<Instance*> getInstances(classId_t id);
 
     static HDRManager* helperObj;
+
+    // Walks the ports and asks its TargetHelper for what lies behind each.
+    PortHelper* portHelper;
 
 private:
 
