@@ -1,5 +1,6 @@
 #include "FCHBAManager.h"
 
+#include "AccessPointHelper.h"
 #include "AdapterHelper.h"
 #include "CommonHelper.h"
 #include "EthernetPortHelper.h"
@@ -19,7 +20,7 @@ FCHBAManager::FCHBAManager() :
     adapterHelper(AdapterHelper::getAdapterHelperInstance()),
     portHelper(PortHelper::getPortHelperObject()),
     commonHelper(CommonHelper::getCommonHelperObject()),
-    accessPointHelper(0),
+    accessPointHelper(AccessPointHelper::getAccessPointHelperInstance()),
     softwareUpdateHelper(0),
     ethernetPortHelper(EthernetPortHelper::getEthernetPortHelperObject()),
     diagnosticHelper(0),
@@ -40,9 +41,8 @@ FCHBAManager* FCHBAManager::getFCHBAManager()
 //
 // The one place where a class id meets the helper that builds its
 // instances. The driver status has been checked by the caller. The software
-// update, diagnostic, access point and physical asset helpers aren't part of
-// the module yet: their classes answer with no instances until they are
-// wired in here.
+// update, diagnostic and physical asset helpers aren't part of the module
+// yet: their classes answer with no instances until they are wired in here.
 //------------------------------------------------------------------------------
 
 Array<Instance*> FCHBAManager::_serve(classId_t id)
@@ -66,8 +66,7 @@ Array<Instance*> FCHBAManager::_serve(classId_t id)
             return portHelper->getInstancesByClass(id);
 
         case ID_VESPERA_RemoteServiceAccessPoint:
-            // AccessPointHelper
-            return Array<Instance*>();
+            return accessPointHelper->getInstancesByClass(id);
 
         case ID_VESPERA_HBASoftwareInstallationService:
         case ID_VESPERA_HBASoftwareInstallationServiceCapabilities:
