@@ -285,6 +285,8 @@ TEST_F(Adapter, ProvidersCallBackIntoTheServer)
     {
         { "enum", 3 },
         { "get", 201 },
+        { "invoke", 201 },
+        { "create", 3 },
         { "thread", 1 },
     };
 

@@ -81,6 +81,28 @@ static uint32 _through_server(const String& what, bool& handled)
         return p ? p->U8.value : 1000;
     }
 
+    if (what == "invoke")
+    {
+        // Frob again, through the server, asking it for a get.
+        Ref<TST_Part> self(tst_make_key("inner", 5));
+        Ref<TST_Part_Frob_method> m(create<TST_Part_Frob_method>(false));
+        __set_null_flags(m.ptr(), true, true, 1);
+        m->Text.set("get");
+        if (cimom::invoke_method("root/test", self.ptr(), m.ptr()) != 0)
+            return 1000;
+        if (m->Count.null || m->return_value.null || m->return_value.value != 7 || !m->Made)
+            return 1001;
+        return m->Count.value;
+    }
+
+    if (what == "create")
+    {
+        Ref<TST_Part> part(tst_make_part("created", 6));
+        int created = cimom::create_instance("root/test", part.ptr());
+        int deleted = cimom::delete_instance("root/test", part.ptr());
+        return (created == 0 ? 1 : 0) + (deleted == 0 ? 2 : 0);
+    }
+
     if (what == "thread")
     {
         Thread t;
