@@ -347,8 +347,14 @@ uint16 PortHelper::getEnabledState(int state)
 Array<Instance*> PortHelper::getInstancesByClass(classId_t id)
 {
     Array<Instance*> result;
-    Json::Value adapters;
 
+    if (!walkServes(id, false))
+    {
+        TLOG(LL_INFO, "Unhandled class support");
+        return result;
+    }
+
+    Json::Value adapters;
     bool called = callLib("libGetAllAdaptersIndexString", libGetAllAdaptersIndexString,
         Json::Value(), adapters);
 
