@@ -941,41 +941,369 @@ CMPIStatus CMPI_Adapter::invokeMethod(CMPIMethodMI* mi,
 }
 
 //
-// Association operations: not served yet.
+// Association operations. The request's path names the source object; the
+// association class is the provider's own.
 //
 
-CMPIStatus CMPI_Adapter::associators(CMPIAssociationMI*, const CMPIContext*,
-    const CMPIResult*, const CMPIObjectPath*, const char*, const char*, const char*,
-    const char*, const char**)
+namespace association
 {
+    // The record of the four operations' callbacks.
+    struct Data
+    {
+        const CMPIBroker* broker;
+        const CMPIContext* context;
+        const CMPIResult* result;
+        const char* name_space;
+        const char** properties;
+        unsigned rc;
+    };
+
+    // An instance's own namespace, else the request's.
+    static const char* _name_space(const Instance* instance, const Data* data)
+    {
+        return instance->__name_space.size() ? instance->__name_space.c_str() : data->name_space;
+    }
+
+    static CMPIrc _names_rc(sint32 status)
+    {
+        switch (status)
+        {
+            case ENUM_ASSOCIATOR_NAMES_OK: return CMPI_RC_OK;
+            case ENUM_ASSOCIATOR_NAMES_FAILED: return CMPI_RC_ERR_FAILED;
+            case ENUM_ASSOCIATOR_NAMES_ACCESS_DENIED: return CMPI_RC_ERR_ACCESS_DENIED;
+            case ENUM_ASSOCIATOR_NAMES_UNSUPPORTED: return CMPI_RC_ERR_NOT_SUPPORTED;
+        }
+        return CMPI_RC_OK;
+    }
+
+    static CMPIrc _references_rc(sint32 status)
+    {
+        switch (status)
+        {
+            case ENUM_REFERENCES_OK: return CMPI_RC_OK;
+            case ENUM_REFERENCES_FAILED: return CMPI_RC_ERR_FAILED;
+            case ENUM_REFERENCES_ACCESS_DENIED: return CMPI_RC_ERR_ACCESS_DENIED;
+            case ENUM_REFERENCES_UNSUPPORTED: return CMPI_RC_ERR_NOT_SUPPORTED;
+        }
+        return CMPI_RC_OK;
+    }
+}
+
+namespace associator_names
+{
+    static bool _proc(Instance* instance, Enum_Associator_Names_Status, void* client_data)
+    {
+        if (!instance)
+            return false;
+
+        Ref<Instance> hold(instance);
+        association::Data* data = (association::Data*)client_data;
+
+        if (data->rc != 0)
+            return false;
+
+        CMPIObjectPath* path = 0;
+        data->rc = make_cmpi_object_path(data->broker, instance,
+            association::_name_space(instance, data), path);
+
+        if (data->rc == 0)
+        {
+            CMReturnObjectPath(data->result, path);
+            CMRelease(path);
+        }
+
+        return true;
+    }
+}
+
+namespace associators1
+{
+    static bool _proc(Instance* instance, Enum_Associators_Status, void* client_data)
+    {
+        if (!instance)
+            return false;
+
+        Ref<Instance> hold(instance);
+        association::Data* data = (association::Data*)client_data;
+
+        if (data->rc != 0)
+            return false;
+
+        CMPIInstance* ci = 0;
+
+        if (make_cmpi_instance(data->broker, instance, association::_name_space(instance, data),
+            0, data->properties, ci) != 0)
+        {
+            data->rc = 1;
+            return false;
+        }
+
+        CMReturnInstance(data->result, ci);
+        CMRelease(ci);
+        return true;
+    }
+}
+
+namespace associators2
+{
+    // The other end comes whole from the server, which may ask another
+    // provider of the module for it.
+    static bool _proc(Instance* instance, Enum_Associator_Names_Status, void* client_data)
+    {
+        if (!instance)
+            return false;
+
+        Ref<Instance> hold(instance);
+        association::Data* data = (association::Data*)client_data;
+
+        if (data->rc != 0)
+            return false;
+
+        CMPIObjectPath* path = 0;
+        data->rc = make_cmpi_object_path(data->broker, instance,
+            association::_name_space(instance, data), path);
+
+        if (data->rc != 0)
+            return false;
+
+        CMPIInstance* ci = CBGetInstance(data->broker, data->context, path, data->properties, 0);
+        CMRelease(path);
+
+        if (!ci)
+        {
+            data->rc = 1;
+            return false;
+        }
+
+        CMReturnInstance(data->result, ci);
+        CMRelease(ci);
+        return true;
+    }
+}
+
+namespace references
+{
+    static bool _proc(Instance* instance, Enum_References_Status, void* client_data)
+    {
+        if (!instance)
+            return false;
+
+        Ref<Instance> hold(instance);
+        association::Data* data = (association::Data*)client_data;
+
+        if (data->rc != 0)
+            return false;
+
+        CMPIObjectPath* path = 0;
+
+        if (make_cmpi_object_path(data->broker, instance, data->name_space, path) != 0)
+            return false;
+
+        filter_properties(instance, data->properties, false);
+
+        CMPIInstance* ci = 0;
+        data->rc = make_cmpi_instance(data->broker, instance, data->name_space, path,
+            data->properties, ci);
+        CMRelease(path);
+
+        if (data->rc != 0)
+            return false;
+
+        CMReturnInstance(data->result, ci);
+        CMRelease(ci);
+        return true;
+    }
+}
+
+namespace reference_names
+{
+    static bool _proc(Instance* instance, Enum_References_Status, void* client_data)
+    {
+        if (!instance)
+            return false;
+
+        Ref<Instance> hold(instance);
+        association::Data* data = (association::Data*)client_data;
+
+        if (data->rc != 0)
+            return false;
+
+        // Paths of the association's keys alone, whatever else the
+        // provider filled in.
+        __set_null_flags(instance, false, true, 1);
+
+        CMPIObjectPath* path = 0;
+        data->rc = make_cmpi_object_path(data->broker, instance, data->name_space, path);
+
+        if (data->rc != 0)
+            return false;
+
+        CMReturnObjectPath(data->result, path);
+        CMRelease(path);
+        return true;
+    }
+}
+
+// The source object of an association request, as an instance of its own
+// class: null (and rc set) if it can't be had.
+static Instance* _source(CMPI_Adapter* adapter, const CMPIObjectPath* object_path,
+    const char* name, CMPIrc& rc)
+{
+    rc = CMPI_RC_OK;
+    const Meta_Class* mc = find_meta_class(adapter->meta_repository(), _class_name_of(object_path));
+
+    if (!mc)
+    {
+        // No result, and no failure: the class is none of the module's.
+        if (strcmp(name, "associators") == 0)
+            CMPI_Adapter::ret(TESSEL_FILE_BASENAME, __LINE__, name, CMPI_RC_OK);
+        else
+            CMPI_Adapter::ret(TESSEL_FILE_BASENAME, __LINE__, name, CMPI_RC_ERR_INVALID_CLASS);
+        return 0;
+    }
+
+    Instance* source = 0;
+    rc = (CMPIrc)make_tessel_reference(0, mc, object_path, source);
+
+    if (rc != CMPI_RC_OK)
+    {
+        CMPI_Adapter::ret(TESSEL_FILE_BASENAME, __LINE__, name, rc);
+        return 0;
+    }
+
+    return source;
+}
+
+static String _filter(const char* text)
+{
+    return String(text ? text : "");
+}
+
+CMPIStatus CMPI_Adapter::associators(CMPIAssociationMI* mi, const CMPIContext* context,
+    const CMPIResult* result, const CMPIObjectPath* object_path, const char*,
+    const char* result_class, const char* role, const char* result_role,
+    const char** properties)
+{
+    CMPI_Adapter* adapter = _adapter(mi);
+    if (!adapter)
+        return _status(CMPI_RC_ERR_FAILED);
+
+    Request_Frame frame(adapter, context);
     ENT("associators");
-    RET("associators", CMPI_RC_ERR_NOT_SUPPORTED);
-    return _status(CMPI_RC_ERR_NOT_SUPPORTED);
+
+    CMPIrc rc;
+    Ref<Instance> source(_source(adapter, object_path, "associators", rc));
+    if (!source)
+        return _status(rc);
+
+    String rclass = _filter(result_class);
+    String rrole = _filter(role);
+    String rresult_role = _filter(result_role);
+    association::Data data =
+        { adapter->broker, context, result, _name_space_of(object_path), properties, 0 };
+
+    sint32 status = adapter->call(OP_ENUM_ASSOCIATORS, source.ptr(), &rclass, &rrole,
+        &rresult_role, (void*)associators1::_proc, &data);
+
+    switch (status)
+    {
+        case ENUM_ASSOCIATORS_OK:
+            RET("associators", CMPI_RC_OK);
+            return _status(CMPI_RC_OK);
+        case ENUM_ASSOCIATORS_FAILED:
+            RET("associators", CMPI_RC_ERR_FAILED);
+            return _status(CMPI_RC_ERR_FAILED);
+        case ENUM_ASSOCIATORS_ACCESS_DENIED:
+            RET("associators", CMPI_RC_ERR_ACCESS_DENIED);
+            return _status(CMPI_RC_ERR_ACCESS_DENIED);
+    }
+
+    data.rc = 0;
+    status = adapter->enum_associator_names(source.ptr(), rclass, rrole, rresult_role,
+        associators2::_proc, &data);
+    rc = association::_names_rc(status);
+
+    RET("associators", rc);
+    return _status(rc);
 }
 
-CMPIStatus CMPI_Adapter::associatorNames(CMPIAssociationMI*, const CMPIContext*,
-    const CMPIResult*, const CMPIObjectPath*, const char*, const char*, const char*,
-    const char*)
+CMPIStatus CMPI_Adapter::associatorNames(CMPIAssociationMI* mi, const CMPIContext* context,
+    const CMPIResult* result, const CMPIObjectPath* object_path, const char*,
+    const char* result_class, const char* role, const char* result_role)
 {
+    CMPI_Adapter* adapter = _adapter(mi);
+    if (!adapter)
+        return _status(CMPI_RC_ERR_FAILED);
+
+    Request_Frame frame(adapter, context);
     ENT("associatorNames");
-    RET("associatorNames", CMPI_RC_ERR_NOT_SUPPORTED);
-    return _status(CMPI_RC_ERR_NOT_SUPPORTED);
+
+    CMPIrc rc;
+    Ref<Instance> source(_source(adapter, object_path, "associatorNames", rc));
+    if (!source)
+        return _status(rc);
+
+    association::Data data =
+        { adapter->broker, context, result, _name_space_of(object_path), 0, 0 };
+    sint32 status = adapter->enum_associator_names(source.ptr(), _filter(result_class),
+        _filter(role), _filter(result_role), associator_names::_proc, &data);
+    rc = association::_names_rc(status);
+
+    RET("associatorNames", rc);
+    return _status(rc);
 }
 
-CMPIStatus CMPI_Adapter::references(CMPIAssociationMI*, const CMPIContext*,
-    const CMPIResult*, const CMPIObjectPath*, const char*, const char*, const char**)
+// references and referenceNames: the provider's associations that refer to
+// the source, whole or as paths.
+static CMPIrc _references(CMPI_Adapter* adapter, const CMPIContext* context,
+    const CMPIResult* result, const CMPIObjectPath* object_path, const char* role,
+    const char** properties, bool names)
 {
+    const char* name = names ? "referenceNames" : "references";
+    CMPIrc rc;
+    Ref<Instance> source(_source(adapter, object_path, name, rc));
+    if (!source)
+        return rc;
+
+    const Meta_Class* mc = adapter->meta_class();
+    Ref<Instance> model(create(mc, false));
+    if (names)
+        __set_null_flags(model.ptr(), false, true, 1);
+
+    association::Data data =
+        { adapter->broker, context, result, _name_space_of(object_path), properties, 0 };
+    sint32 status = adapter->enum_references(source.ptr(), model.ptr(), _filter(role),
+        names ? reference_names::_proc : references::_proc, &data);
+    rc = association::_references_rc(status);
+
+    CMPI_Adapter::ret(TESSEL_FILE_BASENAME, __LINE__, name, rc);
+    return rc;
+}
+
+CMPIStatus CMPI_Adapter::references(CMPIAssociationMI* mi, const CMPIContext* context,
+    const CMPIResult* result, const CMPIObjectPath* object_path, const char*,
+    const char* role, const char** properties)
+{
+    CMPI_Adapter* adapter = _adapter(mi);
+    if (!adapter)
+        return _status(CMPI_RC_ERR_FAILED);
+
+    Request_Frame frame(adapter, context);
     ENT("references");
-    RET("references", CMPI_RC_ERR_NOT_SUPPORTED);
-    return _status(CMPI_RC_ERR_NOT_SUPPORTED);
+    return _status(_references(adapter, context, result, object_path, role, properties, false));
 }
 
-CMPIStatus CMPI_Adapter::referenceNames(CMPIAssociationMI*, const CMPIContext*,
-    const CMPIResult*, const CMPIObjectPath*, const char*, const char*)
+CMPIStatus CMPI_Adapter::referenceNames(CMPIAssociationMI* mi, const CMPIContext* context,
+    const CMPIResult* result, const CMPIObjectPath* object_path, const char*,
+    const char* role)
 {
+    CMPI_Adapter* adapter = _adapter(mi);
+    if (!adapter)
+        return _status(CMPI_RC_ERR_FAILED);
+
+    Request_Frame frame(adapter, context);
     ENT("referenceNames");
-    RET("referenceNames", CMPI_RC_ERR_NOT_SUPPORTED);
-    return _status(CMPI_RC_ERR_NOT_SUPPORTED);
+    return _status(_references(adapter, context, result, object_path, role, 0, true));
 }
 
 //

@@ -162,12 +162,62 @@ const Meta_Class TST_Part::static_meta_class =
     &tst_repository,
 };
 
+static const Meta_Reference _TST_Link_Left =
+{
+    { { 0, FLAG_REFERENCE | FLAG_KEY | FLAG_READ, "Left", 0, 0 } },
+    0, &TST_Part::static_meta_class, (uint32)offsetof(TST_Link, Left),
+};
+
+static const Meta_Reference _TST_Link_Right =
+{
+    { { 0, FLAG_REFERENCE | FLAG_KEY | FLAG_READ, "Right", 0, 0 } },
+    0, &TST_Part::static_meta_class, (uint32)offsetof(TST_Link, Right),
+};
+
+static const Meta_Property _TST_Link_Note =
+{
+    { { 0, FLAG_PROPERTY | FLAG_READ, "Note", 0, 0 } },
+    STRING, 0, (uint32)offsetof(TST_Link, Note), 0,
+};
+
+static Meta_Feature* _TST_Link_MFA[] =
+{
+    (Meta_Feature*)&_TST_Link_Left,
+    (Meta_Feature*)&_TST_Link_Right,
+    (Meta_Feature*)&_TST_Link_Note,
+};
+
+static const uint8 _TST_Link_locals[] = { 1, 1, 1 };
+
+const Meta_Class TST_Link::static_meta_class =
+{
+    { 0, FLAG_ASSOCIATION, "TST_Link", 0, 0 },
+    _TST_Link_MFA,
+    3,
+    sizeof(TST_Link),
+    _TST_Link_locals,
+    0,
+    2,
+    &tst_repository,
+};
+
 static const Meta_Class* const _tst_classes[] =
 {
     &TST_Part::static_meta_class,
+    &TST_Link::static_meta_class,
 };
 
-const Meta_Repository tst_repository = { _tst_classes, 1 };
+const Meta_Repository tst_repository = { _tst_classes, 2 };
+
+TST_Link* tst_make_link(const char* left, uint16 left_index,
+    const char* right, uint16 right_index)
+{
+    TST_Link* link = create<TST_Link>(false);
+    link->Left = tst_make_key(left, left_index);
+    link->Right = tst_make_key(right, right_index);
+    link->Note.set(String(left, "-", right));
+    return link;
+}
 
 TST_Part* tst_make_key(const char* name, uint16 index)
 {

@@ -61,6 +61,16 @@ struct TST_Part_Frob_method : Instance
     static const Meta_Method static_meta_class;
 };
 
+// An association between two parts.
+struct TST_Link : Instance
+{
+    TST_Part* Left;
+    TST_Part* Right;
+    Property<String> Note;
+
+    static const Meta_Class static_meta_class;
+};
+
 extern const Meta_Repository tst_repository;
 
 // A part with the keys and every property set to values derived from
@@ -69,6 +79,10 @@ TST_Part* tst_make_part(const char* name, uint16 index);
 
 // Only the keys.
 TST_Part* tst_make_key(const char* name, uint16 index);
+
+// A link between the keys of two parts.
+TST_Link* tst_make_link(const char* left, uint16 left_index,
+    const char* right, uint16 right_index);
 
 } // namespace OLMA
 

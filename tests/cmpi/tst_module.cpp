@@ -222,6 +222,75 @@ public:
     }
 };
 
+// Serves TST_Link by enumeration alone, so that the runtime's generic
+// association paths do the filtering.
+class TST_Link_Provider
+{
+public:
+
+    Load_Status load() { return LOAD_OK; }
+
+    Unload_Status unload() { return UNLOAD_OK; }
+
+    Get_Instance_Status get_instance(const TST_Link*, TST_Link*&)
+    {
+        return GET_INSTANCE_UNSUPPORTED;
+    }
+
+    Enum_Instances_Status enum_instances(const TST_Link*, Enum_Instances_Handler<TST_Link>* handler)
+    {
+        if (_state.self_link && !handler->handle(tst_make_link("part0", 0, "part0", 0)))
+            return ENUM_INSTANCES_OK;
+
+        for (unsigned i = 0; i + 1 < _state.count; i++)
+        {
+            char left[32], right[32];
+            snprintf(left, sizeof(left), "part%u", i);
+            snprintf(right, sizeof(right), "part%u", i + 1);
+            if (!handler->handle(tst_make_link(left, uint16(i), right, uint16(i + 1))))
+                break;
+        }
+
+        return Enum_Instances_Status(_state.enum_status);
+    }
+
+    Create_Instance_Status create_instance(TST_Link*) { return CREATE_INSTANCE_UNSUPPORTED; }
+
+    Delete_Instance_Status delete_instance(const TST_Link*) { return DELETE_INSTANCE_UNSUPPORTED; }
+
+    Modify_Instance_Status modify_instance(const TST_Link*, const TST_Link*)
+    {
+        return MODIFY_INSTANCE_UNSUPPORTED;
+    }
+
+    Enum_Associator_Names_Status enum_associator_names(const Instance*, const String&,
+        const String&, const String&, Enum_Associator_Names_Handler<Instance>*)
+    {
+        return ENUM_ASSOCIATOR_NAMES_UNSUPPORTED;
+    }
+
+    Enum_Associators_Status enum_associators(const Instance*, const String&,
+        const String&, const String&, Enum_Associators_Handler<Instance>*)
+    {
+        return ENUM_ASSOCIATORS_UNSUPPORTED;
+    }
+
+    Enum_References_Status enum_references(const Instance*, const TST_Link*,
+        const String&, Enum_References_Handler<TST_Link>*)
+    {
+        return ENUM_REFERENCES_UNSUPPORTED;
+    }
+};
+
+extern "C" sint32 __tessel_TST_Link_Provider_proc(
+    const Registration* registration, int operation,
+    void* arg0, void* arg1, void* arg2, void* arg3,
+    void* arg4, void* arg5, void* arg6, void* arg7)
+{
+    return __dispatch_association<TST_Link, TST_Link_Provider>(
+        registration, operation, arg0, arg1, arg2, arg3, arg4, arg5, arg6, arg7);
+}
+
 static sint32 _TST_Part_Provider_invoke(
     TST_Part_Provider* provider, const TST_Part* self, Instance* method)
 {
@@ -260,6 +329,17 @@ static Registration _TST_Part_Provider_registration =
 
 static CMPI_Static_Data _cmpi_static_dataTST_Part_Provider;
 
+static Registration _TST_Link_Provider_registration =
+{
+    "vspr_cmpi_test_module",
+    "TST_Link_Provider",
+    __tessel_TST_Link_Provider_proc,
+    &TST_Link::static_meta_class,
+    &_TST_Part_Provider_registration,
+};
+
+static CMPI_Static_Data _cmpi_static_dataTST_Link_Provider;
+
 } // namespace OLMA
 
 using namespace OLMA;
@@ -271,7 +351,7 @@ extern "C" CMPI_EXPORT Tst_State* tst_state()
 
 extern "C" CMPI_EXPORT const Registration* tessel_module()
 {
-    return &_TST_Part_Provider_registration;
+    return &_TST_Link_Provider_registration;
 }
 
 extern "C" CMPI_EXPORT CMPIInstanceMI* TST_Part_Provider_Create_InstanceMI(
@@ -291,3 +371,18 @@ extern "C" CMPI_EXPORT CMPIMethodMI* TST_Part_Provider_Create_MethodMI(
         broker, context, "TST_Part_Provider", 'M', &mi);
     return (CMPIMethodMI*)mi;
 }
+
+#define TST_LINK_ENTRY(TYPE, KIND, LETTER) \
+    extern "C" CMPI_EXPORT TYPE* TST_Link_Provider_Create_##KIND##MI( \
+        const CMPIBroker* broker, const CMPIContext* context, CMPIStatus*) \
+    { \
+        void* mi = 0; \
+        tessel_cmpi_adapter(&_cmpi_static_dataTST_Link_Provider, \
+            &_TST_Link_Provider_registration, broker, context, "TST_Link_Provider", \
+            LETTER, &mi); \
+        return (TYPE*)mi; \
+    }
+
+TST_LINK_ENTRY(CMPIInstanceMI, Instance, 'I')
+TST_LINK_ENTRY(CMPIMethodMI, Method, 'M')
+TST_LINK_ENTRY(CMPIAssociationMI, Association, 'A')

@@ -24,6 +24,10 @@ struct Tst_State
     unsigned count;
     bool deny_unload;
 
+    // Links: part i to part i + 1 for each part but the last, and, if asked,
+    // part 0 to itself.
+    bool self_link;
+
     // Life cycle.
     unsigned constructed;
     unsigned destructed;

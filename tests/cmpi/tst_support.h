@@ -30,6 +30,12 @@ inline std::string tst_write_reg()
         "   provider: TST_Part_Provider\n"
         "   location: vspr_cmpi_test_module\n"
         "   type: instance method\n"
+        "   namespace: root/test\n"
+        "\n"
+        "[TST_Link]\n"
+        "   provider: TST_Link_Provider\n"
+        "   location: vspr_cmpi_test_module\n"
+        "   type: instance association method\n"
         "   namespace: root/test\n");
     fclose(f);
     return path;
