@@ -4,6 +4,7 @@
 #include "AdapterHelper.h"
 #include "CommonHelper.h"
 #include "EthernetPortHelper.h"
+#include "PhysicalAssetHelper.h"
 #include "PortHelper.h"
 #include "ProviderUtil.h"
 #include "log.h"
@@ -24,7 +25,7 @@ FCHBAManager::FCHBAManager() :
     softwareUpdateHelper(0),
     ethernetPortHelper(EthernetPortHelper::getEthernetPortHelperObject()),
     diagnosticHelper(0),
-    physicalAssetHelper(0)
+    physicalAssetHelper(PhysicalAssetHelper::getPhysicalAssetHelperObject())
 {
 }
 
@@ -41,8 +42,8 @@ FCHBAManager* FCHBAManager::getFCHBAManager()
 //
 // The one place where a class id meets the helper that builds its
 // instances. The driver status has been checked by the caller. The software
-// update, diagnostic and physical asset helpers aren't part of the module
-// yet: their classes answer with no instances until they are wired in here.
+// update and diagnostic helpers aren't part of the module yet: their classes
+// answer with no instances until they are wired in here.
 //------------------------------------------------------------------------------
 
 Array<Instance*> FCHBAManager::_serve(classId_t id)
@@ -92,8 +93,7 @@ Array<Instance*> FCHBAManager::_serve(classId_t id)
             return Array<Instance*>();
 
         case ID_VESPERA_PhysicalConnector:
-            // PhysicalAssetHelper
-            return Array<Instance*>();
+            return physicalAssetHelper->getInstancesByClass(id);
 
         default:
             return Array<Instance*>();
