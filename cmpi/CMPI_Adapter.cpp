@@ -6,6 +6,7 @@
 #include "Instance.h"
 #include "Strings.h"
 #include "log.h"
+#include "Mutex.h"
 
 #define ENT(NAME) ent(TESSEL_FILE_BASENAME, __LINE__, NAME)
 #define RET(...) ret(TESSEL_FILE_BASENAME, __LINE__, __VA_ARGS__)
@@ -1307,8 +1308,45 @@ CMPIStatus CMPI_Adapter::referenceNames(CMPIAssociationMI* mi, const CMPIContext
 }
 
 //
-// Indication operations: not served yet.
+// Indication operations. The adapter counts the namespaces of active
+// filters; the provider, once enabled, sends its indications from a thread
+// of its own through _indication_proc, which delivers each to every such
+// namespace.
 //
+
+// Called by the provider's handler, on the provider's thread, whose
+// context (inherited from the enabling request) reaches the server.
+static bool _indication_proc(Instance* instance, void* client_data)
+{
+    CMPI_Adapter* adapter = (CMPI_Adapter*)client_data;
+    Auto_Mutex auto_lock(adapter->lock);
+
+    if (!instance)
+        return false;
+
+    Ref<Instance> hold(instance);
+    CMPI_Thread_Context* top = static_cast<CMPI_Thread_Context*>(Thread_Context::top());
+
+    if (!top || !top->broker || !top->context)
+    {
+        TLOG(LL_WARN, "no thread context: indication of %s dropped", instance->meta_class->name);
+        return true;
+    }
+
+    for (size_t i = 0; i < adapter->name_spaces.size(); i++)
+    {
+        const char* ns = adapter->name_spaces[i].name_space.c_str();
+        CMPIInstance* ci = 0;
+
+        if (make_cmpi_instance(adapter->broker, instance, ns, 0, 0, ci) != 0)
+            continue;
+
+        CBDeliverIndication(top->broker, top->context, ns, ci);
+        CMRelease(ci);
+    }
+
+    return true;
+}
 
 CMPIStatus CMPI_Adapter::authorizeFilter(CMPIIndicationMI*, const CMPIContext*,
     const CMPISelectExp*, const char*, const CMPIObjectPath*, const char*)
@@ -1326,34 +1364,110 @@ CMPIStatus CMPI_Adapter::mustPoll(CMPIIndicationMI*, const CMPIContext*,
     return _status(CMPI_RC_OK);
 }
 
-CMPIStatus CMPI_Adapter::activateFilter(CMPIIndicationMI*, const CMPIContext*,
-    const CMPISelectExp*, const char*, const CMPIObjectPath*, CMPIBoolean)
+CMPIStatus CMPI_Adapter::activateFilter(CMPIIndicationMI* mi, const CMPIContext*,
+    const CMPISelectExp*, const char*, const CMPIObjectPath* object_path, CMPIBoolean)
 {
+    CMPI_Adapter* adapter = _adapter(mi);
+    if (!adapter)
+        return _status(CMPI_RC_ERR_FAILED);
+
+    Auto_Mutex auto_lock(adapter->lock);
     ENT("activateFilter");
-    RET("activateFilter", CMPI_RC_ERR_NOT_SUPPORTED);
-    return _status(CMPI_RC_ERR_NOT_SUPPORTED);
+
+    Name_Space_Entry entry(_name_space_of(object_path), 1);
+    size_t pos = adapter->name_spaces.find(entry);
+
+    if (pos == (size_t)-1)
+        adapter->name_spaces.append(entry);
+    else
+        adapter->name_spaces[pos].ref_count++;
+
+    RET("activateFilter", CMPI_RC_OK);
+    return _status(CMPI_RC_OK);
 }
 
-CMPIStatus CMPI_Adapter::deactivateFilter(CMPIIndicationMI*, const CMPIContext*,
-    const CMPISelectExp*, const char*, const CMPIObjectPath*, CMPIBoolean)
+CMPIStatus CMPI_Adapter::deactivateFilter(CMPIIndicationMI* mi, const CMPIContext*,
+    const CMPISelectExp*, const char*, const CMPIObjectPath* object_path, CMPIBoolean)
 {
+    CMPI_Adapter* adapter = _adapter(mi);
+    if (!adapter)
+        return _status(CMPI_RC_ERR_FAILED);
+
+    Auto_Mutex auto_lock(adapter->lock);
     ENT("deactivateFilter");
-    RET("deactivateFilter", CMPI_RC_ERR_NOT_SUPPORTED);
-    return _status(CMPI_RC_ERR_NOT_SUPPORTED);
+
+    Name_Space_Entry entry(_name_space_of(object_path), 1);
+    size_t pos = adapter->name_spaces.find(entry);
+
+    if (pos != (size_t)-1)
+    {
+        if (adapter->name_spaces[pos].ref_count <= 1)
+            adapter->name_spaces.remove(pos);
+        else
+            adapter->name_spaces[pos].ref_count--;
+    }
+
+    RET("deactivateFilter", CMPI_RC_OK);
+    return _status(CMPI_RC_OK);
 }
 
-CMPIStatus CMPI_Adapter::enableIndications(CMPIIndicationMI*, const CMPIContext*)
+CMPIStatus CMPI_Adapter::enableIndications(CMPIIndicationMI* mi, const CMPIContext* context)
 {
+    CMPI_Adapter* adapter = _adapter(mi);
+    if (!adapter)
+        return _status(CMPI_RC_ERR_FAILED);
+
+    // The provider starts its thread here, which inherits this context.
+    Request_Frame frame(adapter, context);
     ENT("enableIndications");
-    RET("enableIndications", CMPI_RC_ERR_NOT_SUPPORTED);
-    return _status(CMPI_RC_ERR_NOT_SUPPORTED);
+
+    if (adapter->indications_enabled)
+    {
+        RET("enableIndications", CMPI_RC_OK);
+        return _status(CMPI_RC_OK);
+    }
+
+    adapter->indications_enabled = true;
+    sint32 status = adapter->call(OP_ENABLE_INDICATIONS, (void*)_indication_proc, adapter);
+
+    if (status == ENABLE_INDICATIONS_FAILED)
+    {
+        RET("enableIndications", CMPI_RC_ERR_FAILED);
+        return _status(CMPI_RC_ERR_FAILED);
+    }
+
+    RET("enableIndications", CMPI_RC_OK);
+    return _status(CMPI_RC_OK);
 }
 
-CMPIStatus CMPI_Adapter::disableIndications(CMPIIndicationMI*, const CMPIContext*)
+CMPIStatus CMPI_Adapter::disableIndications(CMPIIndicationMI* mi, const CMPIContext* context)
 {
+    CMPI_Adapter* adapter = _adapter(mi);
+    if (!adapter)
+        return _status(CMPI_RC_ERR_FAILED);
+
+    Request_Frame frame(adapter, context);
     ENT("disableIndications");
-    RET("disableIndications", CMPI_RC_ERR_NOT_SUPPORTED);
-    return _status(CMPI_RC_ERR_NOT_SUPPORTED);
+
+    if (!adapter->indications_enabled)
+        return _status(CMPI_RC_OK);
+
+    adapter->indications_enabled = false;
+
+    // The provider waits here for its thread, whose delivery in flight
+    // needs the lock: it is let go for the call.
+    adapter->lock.unlock();
+    sint32 status = adapter->call(OP_DISABLE_INDICATIONS);
+    adapter->lock.lock();
+
+    if (status == DISABLE_INDICATIONS_FAILED)
+    {
+        RET("disableIndications", CMPI_RC_ERR_FAILED);
+        return _status(CMPI_RC_ERR_FAILED);
+    }
+
+    RET("disableIndications", CMPI_RC_OK);
+    return _status(CMPI_RC_OK);
 }
 
 } // namespace OLMA

@@ -201,13 +201,46 @@ const Meta_Class TST_Link::static_meta_class =
     &tst_repository,
 };
 
+static const Meta_Property _TST_Alert_Message =
+{
+    { { 0, FLAG_PROPERTY | FLAG_READ, "Message", 0, 0 } },
+    STRING, 0, (uint32)offsetof(TST_Alert, Message), 0,
+};
+
+static const Meta_Property _TST_Alert_Sequence =
+{
+    { { 0, FLAG_PROPERTY | FLAG_READ, "Sequence", 0, 0 } },
+    UINT32, 0, (uint32)offsetof(TST_Alert, Sequence), 0,
+};
+
+static Meta_Feature* _TST_Alert_MFA[] =
+{
+    (Meta_Feature*)&_TST_Alert_Message,
+    (Meta_Feature*)&_TST_Alert_Sequence,
+};
+
+static const uint8 _TST_Alert_locals[] = { 1, 1 };
+
+const Meta_Class TST_Alert::static_meta_class =
+{
+    { 0, FLAG_INDICATION, "TST_Alert", 0, 0 },
+    _TST_Alert_MFA,
+    2,
+    sizeof(TST_Alert),
+    _TST_Alert_locals,
+    0,
+    0,
+    &tst_repository,
+};
+
 static const Meta_Class* const _tst_classes[] =
 {
     &TST_Part::static_meta_class,
     &TST_Link::static_meta_class,
+    &TST_Alert::static_meta_class,
 };
 
-const Meta_Repository tst_repository = { _tst_classes, 2 };
+const Meta_Repository tst_repository = { _tst_classes, 3 };
 
 TST_Link* tst_make_link(const char* left, uint16 left_index,
     const char* right, uint16 right_index)

@@ -71,6 +71,15 @@ struct TST_Link : Instance
     static const Meta_Class static_meta_class;
 };
 
+// An indication, with no keys.
+struct TST_Alert : Instance
+{
+    Property<String> Message;
+    Property<uint32> Sequence;
+
+    static const Meta_Class static_meta_class;
+};
+
 extern const Meta_Repository tst_repository;
 
 // A part with the keys and every property set to values derived from

@@ -11,6 +11,7 @@
 #include "CMPI_Adapter.h"
 #include "cimom.h"
 #include "Thread.h"
+#include "Time.h"
 
 namespace OLMA
 {
@@ -282,6 +283,88 @@ public:
     }
 };
 
+// Sends TST_Alert from a thread of its own while enabled: as many as the
+// tests ask for through pending.
+class TST_Alert_Provider
+{
+public:
+
+    TST_Alert_Provider() : _handler(0), _stop(false) { }
+
+    ~TST_Alert_Provider() { delete _handler; }
+
+    Load_Status load() { return LOAD_OK; }
+
+    Unload_Status unload() { return UNLOAD_OK; }
+
+    Enable_Indications_Status enable_indications(Indication_Handler<TST_Alert>* handler)
+    {
+        _state.enables++;
+        _handler = handler;
+
+        if (_state.enable_status != ENABLE_INDICATIONS_OK)
+            return Enable_Indications_Status(_state.enable_status);
+
+        _stop = false;
+        Thread::create_joinable(_thread, _proc, this);
+        return ENABLE_INDICATIONS_OK;
+    }
+
+    Disable_Indications_Status disable_indications()
+    {
+        _state.disables++;
+        _stop = true;
+        void* rv;
+        Thread::join(_thread, rv);
+
+        // The end of the stream, and the handler goes with it.
+        if (_handler)
+        {
+            _state.stream_ended = !_handler->handle(0);
+            delete _handler;
+            _handler = 0;
+        }
+
+        return DISABLE_INDICATIONS_OK;
+    }
+
+private:
+
+    static void* _proc(void* arg)
+    {
+        TST_Alert_Provider* self = (TST_Alert_Provider*)arg;
+
+        while (!self->_stop)
+        {
+            if (_state.pending)
+            {
+                _state.pending--;
+                TST_Alert* alert = create<TST_Alert>(false);
+                alert->Message.set("alert");
+                alert->Sequence.set(++_state.alerts_sent);
+                self->_handler->handle(alert);
+            }
+            else
+                Time::sleep(Time::MSEC);
+        }
+
+        return 0;
+    }
+
+    Indication_Handler<TST_Alert>* _handler;
+    Thread _thread;
+    volatile bool _stop;
+};
+
+extern "C" sint32 __tessel_TST_Alert_Provider_proc(
+    const Registration* registration, int operation,
+    void* arg0, void* arg1, void* arg2, void* arg3,
+    void* arg4, void* arg5, void* arg6, void* arg7)
+{
+    return __dispatch_indication<TST_Alert, TST_Alert_Provider>(
+        registration, operation, arg0, arg1, arg2, arg3, arg4, arg5, arg6, arg7);
+}
+
 extern "C" sint32 __tessel_TST_Link_Provider_proc(
     const Registration* registration, int operation,
     void* arg0, void* arg1, void* arg2, void* arg3,
@@ -340,6 +423,17 @@ static Registration _TST_Link_Provider_registration =
 
 static CMPI_Static_Data _cmpi_static_dataTST_Link_Provider;
 
+static Registration _TST_Alert_Provider_registration =
+{
+    "vspr_cmpi_test_module",
+    "TST_Alert_Provider",
+    __tessel_TST_Alert_Provider_proc,
+    &TST_Alert::static_meta_class,
+    &_TST_Link_Provider_registration,
+};
+
+static CMPI_Static_Data _cmpi_static_dataTST_Alert_Provider;
+
 } // namespace OLMA
 
 using namespace OLMA;
@@ -351,7 +445,7 @@ extern "C" CMPI_EXPORT Tst_State* tst_state()
 
 extern "C" CMPI_EXPORT const Registration* tessel_module()
 {
-    return &_TST_Link_Provider_registration;
+    return &_TST_Alert_Provider_registration;
 }
 
 extern "C" CMPI_EXPORT CMPIInstanceMI* TST_Part_Provider_Create_InstanceMI(
@@ -386,3 +480,21 @@ extern "C" CMPI_EXPORT CMPIMethodMI* TST_Part_Provider_Create_MethodMI(
 TST_LINK_ENTRY(CMPIInstanceMI, Instance, 'I')
 TST_LINK_ENTRY(CMPIMethodMI, Method, 'M')
 TST_LINK_ENTRY(CMPIAssociationMI, Association, 'A')
+
+extern "C" CMPI_EXPORT CMPIIndicationMI* TST_Alert_Provider_Create_IndicationMI(
+    const CMPIBroker* broker, const CMPIContext* context, CMPIStatus*)
+{
+    void* mi = 0;
+    tessel_cmpi_adapter(&_cmpi_static_dataTST_Alert_Provider, &_TST_Alert_Provider_registration,
+        broker, context, "TST_Alert_Provider", 'N', &mi);
+    return (CMPIIndicationMI*)mi;
+}
+
+extern "C" CMPI_EXPORT CMPIMethodMI* TST_Alert_Provider_Create_MethodMI(
+    const CMPIBroker* broker, const CMPIContext* context, CMPIStatus*)
+{
+    void* mi = 0;
+    tessel_cmpi_adapter(&_cmpi_static_dataTST_Alert_Provider, &_TST_Alert_Provider_registration,
+        broker, context, "TST_Alert_Provider", 'M', &mi);
+    return (CMPIMethodMI*)mi;
+}

@@ -28,6 +28,15 @@ struct Tst_State
     // part 0 to itself.
     bool self_link;
 
+    // Indications: the status of enable_indications, how many alerts the
+    // provider's thread is still to send, and what happened.
+    int enable_status;
+    unsigned pending;
+    unsigned enables;
+    unsigned disables;
+    unsigned alerts_sent;
+    bool stream_ended;
+
     // Life cycle.
     unsigned constructed;
     unsigned destructed;

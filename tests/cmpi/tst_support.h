@@ -36,7 +36,13 @@ inline std::string tst_write_reg()
         "   provider: TST_Link_Provider\n"
         "   location: vspr_cmpi_test_module\n"
         "   type: instance association method\n"
-        "   namespace: root/test\n");
+        "   namespace: root/test\n"
+        "\n"
+        "[TST_Alert]\n"
+        "   provider: TST_Alert_Provider\n"
+        "   location: vspr_cmpi_test_module\n"
+        "   type: indication method\n"
+        "   namespace: root/test root/other\n");
     fclose(f);
     return path;
 }
