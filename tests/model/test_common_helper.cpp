@@ -5,31 +5,20 @@
 // name resolves to loopback only or not at all, and one without a name.
 // Until a test picks a host, both pass through to the real functions.
 
-#include <gtest/gtest.h>
-
 #include <dlfcn.h>
 #include <errno.h>
 #include <netdb.h>
 #include <arpa/inet.h>
-#include <signal.h>
-#include <stdlib.h>
 #include <string.h>
-#include <sys/wait.h>
-#include <unistd.h>
 
-#include <filesystem>
-#include <fstream>
-#include <sstream>
-#include <string>
 #include <vector>
 
 #include "AccessPointHelper.h"
-#include "CIMProviderTruj.h"
 #include "CommonHelper.h"
 #include "EthernetPortHelper.h"
 #include "ProviderUtil.h"
 #include "VESPERA_ComputerSystem.h"
-#include "log.h"
+#include "test_ethernet_helper.h"
 
 using namespace OLMA;
 
@@ -113,129 +102,14 @@ extern "C" int gethostbyname_r(const char* name, struct hostent* ret,
 namespace
 {
 
-std::string readFile(const std::string& path)
-{
-    std::stringstream text;
-    text << std::ifstream(path.c_str(), std::ios::binary).rdbuf();
-    return text.str();
-}
-
-// A HOME of this process with the log on at DBG; removed at exit.
-std::string home()
-{
-    struct Home
-    {
-        std::string dir;
-        Home()
-        {
-            char name[] = "/tmp/vspr-host-XXXXXX";
-            dir = mkdtemp(name) ? name : "/tmp";
-            std::ofstream(dir + "/.tesselrc") << "LOG_LEVEL=DBG\n";
-            setenv("HOME", dir.c_str(), 1);
-            close_log();
-            log(LL_INFO, "test_common_helper.cpp", __LINE__, "test log");
-        }
-        ~Home()
-        {
-            std::error_code ec;
-            std::filesystem::remove_all(dir, ec);
-        }
-    };
-    static Home h;
-    return h.dir;
-}
-
-class Log
-{
-public:
-    Log() : _start(readFile(path()).size()) { }
-    std::string text() const { return readFile(path()).substr(_start); }
-
-    size_t count(const std::string& level, const std::string& piece) const
-    {
-        std::istringstream in(text());
-        std::string line;
-        size_t n = 0;
-        while (std::getline(in, line))
-            n += line.find(level + ": ") != std::string::npos &&
-                line.find(piece) != std::string::npos;
-        return n;
-    }
-
-    static std::string path() { return home() + "/.tessel/messages"; }
-
-private:
-    size_t _start;
-};
-
-std::string str(const String& s)
-{
-    return std::string(s.c_str(), s.size());
-}
-
-std::vector<std::string> strs(const Property<Array<String> >& p)
-{
-    std::vector<std::string> v;
-    for (size_t i = 0; i < p.value.size(); i++)
-        v.push_back(str(p.value[i]));
-    return v;
-}
-
-struct Walk
-{
-    Array<Instance*> all;
-    explicit Walk(const Array<Instance*>& a) : all(a) { }
-    ~Walk()
-    {
-        for (size_t i = 0; i < all.size(); i++)
-            destroyer(all[i]);
-    }
-    size_t size() const { return all.size(); }
-};
-
-// The console agent as the process list shows it: a sleep started under the
-// name zarkagent. It is ended when the object goes.
-class Agent
-{
-public:
-    Agent()
-    {
-        std::string link = home() + "/zarkagent";
-        std::error_code ec;
-        std::filesystem::remove(link, ec);
-        std::filesystem::create_symlink("/bin/sleep", link, ec);
-
-        _pid = fork();
-        if (_pid == 0)
-        {
-            execl(link.c_str(), "zarkagent", "60", (char*)0);
-            _exit(127);
-        }
-
-        // Wait until ps can see it.
-        for (int i = 0; i < 100 && !ProviderUtil::getProviderUtil()->getAgentPort(); i++)
-            usleep(20000);
-    }
-
-    ~Agent()
-    {
-        if (_pid > 0)
-        {
-            kill(_pid, SIGTERM);
-            waitpid(_pid, 0, 0);
-        }
-    }
-
-private:
-    pid_t _pid;
-};
+using namespace eth_test;
 
 class HostTest : public ::testing::Test
 {
 protected:
     void SetUp() override
     {
-        home();
+        workDir();
         ASSERT_TRUE(gTrujLibLoaded) << "the start-up didn't load libdtruj.so";
     }
 
@@ -252,10 +126,11 @@ protected:
         played.addresses = addresses;
     }
 
-    VESPERA_ComputerSystem* host(Walk& w)
+    // The one host instance.
+    VESPERA_ComputerSystem* host(Walk<VESPERA_ComputerSystem>& w)
     {
         EXPECT_EQ(1u, w.size());
-        return w.size() ? checked_cast<VESPERA_ComputerSystem>(w.all[0]) : 0;
+        return w.size() ? w[0] : 0;
     }
 };
 
@@ -264,77 +139,71 @@ CommonHelper* common()
     return CommonHelper::getCommonHelperObject();
 }
 
-AccessPointHelper* access()
+AccessPointHelper* accessPoints()
 {
     return AccessPointHelper::getAccessPointHelperInstance();
 }
 
-const char* const HOST_TEXT = "The host with Vespera's adapters installed.";
+std::vector<std::string> strs(const Property<Array<String> >& p)
+{
+    std::vector<std::string> v;
+    for (size_t i = 0; i < p.value.size(); i++)
+        v.push_back(str(p.value[i]));
+    return v;
+}
+
+typedef std::vector<std::string> Texts;
 
 } // namespace
 
-TEST_F(HostTest, HostWithAnAddressIsNamedByIt)
+TEST_F(HostTest, EachKindOfHost)
 {
-    // Loopback addresses come first and are passed over.
-    play(WITH_ADDRESS, "blade7", { "127.0.1.1", "10.20.30.40", "10.20.30.41" });
-    Log log;
-    Walk w(common()->getComputerSystemInstances(ID_VESPERA_ComputerSystem));
-    VESPERA_ComputerSystem* cs = host(w);
-    ASSERT_TRUE(cs);
-
-    EXPECT_EQ("10.20.30.40", str(cs->Name.value));
-    EXPECT_EQ("VESPERA_ComputerSystem", str(cs->CreationClassName.value));
-    EXPECT_EQ("IP", str(cs->NameFormat.value));
-    EXPECT_EQ(std::vector<std::string>{"10.20.30.40"}, strs(cs->OtherIdentifyingInfo));
-    EXPECT_EQ(std::vector<std::string>{"Ipv4 Address"}, strs(cs->IdentifyingDescriptions));
-    EXPECT_EQ(HOST_TEXT, str(cs->ElementName.value));
-    EXPECT_EQ(HOST_TEXT, str(cs->Description.value));
-    EXPECT_EQ(HOST_TEXT, str(cs->Caption.value));
-    ASSERT_EQ(2u, cs->Dedicated.value.size());
-    EXPECT_EQ(0, cs->Dedicated.value[0]);
-    EXPECT_EQ(14, cs->Dedicated.value[1]);
-    ASSERT_EQ(1u, cs->OperationalStatus.value.size());
-    EXPECT_EQ(2, cs->OperationalStatus.value[0]);
-    EXPECT_EQ(std::vector<std::string>{"The System is in service"}, strs(cs->StatusDescriptions));
-    EXPECT_EQ(0u, log.count("WARN", ""));
-
-    // The ports name the host the same way.
-    Walk ports(EthernetPortHelper::getEthernetPortHelperObject()->getInstancesByClass(
-        ID_VESPERA_LANEndpoint));
-    ASSERT_EQ(1u, ports.size());
-    EXPECT_EQ("10.20.30.40", str(checked_cast<VESPERA_LANEndpoint>(ports.all[0])->SystemName.value));
-}
-
-TEST_F(HostTest, HostKnownByNameOnly)
-{
-    // Resolving to loopback only, or not at all: the plain host name.
-    for (Played kind : { LOOPBACK_ONLY, UNRESOLVED })
+    struct Case
     {
-        play(kind, "blade7", { "127.0.0.1", "127.0.1.1" });
+        Played kind;
+        std::vector<std::string> addresses;
+        const char* name;
+        const char* nameFormat;
+        const char* description;
+    };
+    // Loopback addresses are passed over; a host without an address is
+    // named by its plain name, and one without a name is "localhost".
+    const Case cases[] = {
+        { WITH_ADDRESS, { "127.0.1.1", "10.20.30.40", "10.20.30.41" }, "10.20.30.40", "IP",
+          "Ipv4 Address" },
+        { LOOPBACK_ONLY, { "127.0.0.1", "127.0.1.1" }, "blade7", "Other", "Fully Qualified Domain Name" },
+        { UNRESOLVED, {}, "blade7", "Other", "Fully Qualified Domain Name" },
+        { NAMELESS, {}, "localhost", "Other", "Fully Qualified Domain Name" },
+    };
+    for (const Case& c : cases)
+    {
+        play(c.kind, "blade7", c.addresses);
         Log log;
-        Walk w(common()->getComputerSystemInstances(ID_VESPERA_ComputerSystem));
+        Walk<VESPERA_ComputerSystem> w(common()->getComputerSystemInstances(ID_VESPERA_ComputerSystem));
         VESPERA_ComputerSystem* cs = host(w);
         ASSERT_TRUE(cs);
-        EXPECT_EQ("blade7", str(cs->Name.value));
-        EXPECT_EQ("Other", str(cs->NameFormat.value));
-        EXPECT_EQ(std::vector<std::string>{"blade7"}, strs(cs->OtherIdentifyingInfo));
-        EXPECT_EQ(std::vector<std::string>{"Fully Qualified Domain Name"},
-            strs(cs->IdentifyingDescriptions));
-        EXPECT_EQ(0u, log.count("WARN", ""));
-    }
+        EXPECT_EQ(c.name, str(cs->Name.value));
+        EXPECT_EQ("VESPERA_ComputerSystem", str(cs->CreationClassName.value));
+        EXPECT_EQ(c.nameFormat, str(cs->NameFormat.value));
+        EXPECT_EQ(Texts{c.name}, strs(cs->OtherIdentifyingInfo));
+        EXPECT_EQ(Texts{c.description}, strs(cs->IdentifyingDescriptions));
+        for (const Property<String>* p : { &cs->ElementName, &cs->Description, &cs->Caption })
+            EXPECT_EQ("The host with Vespera's adapters installed.", str(p->value));
+        ASSERT_EQ(2u, cs->Dedicated.value.size());
+        EXPECT_EQ(0, cs->Dedicated.value[0]);
+        EXPECT_EQ(14, cs->Dedicated.value[1]);
+        ASSERT_EQ(1u, cs->OperationalStatus.value.size());
+        EXPECT_EQ(2, cs->OperationalStatus.value[0]);
+        EXPECT_EQ(Texts{"The System is in service"}, strs(cs->StatusDescriptions));
+        EXPECT_EQ(c.kind == NAMELESS ? 1u : 0u, log.count("WARN", "No host IP / Name  retrived "
+            "in the function, So function fills localhost for host info."));
 
-    // Without a name at all the host still has its instance.
-    play(NAMELESS, "");
-    Log log;
-    Walk w(common()->getComputerSystemInstances(ID_VESPERA_ComputerSystem));
-    VESPERA_ComputerSystem* cs = host(w);
-    ASSERT_TRUE(cs);
-    EXPECT_EQ("localhost", str(cs->Name.value));
-    EXPECT_EQ("Other", str(cs->NameFormat.value));
-    EXPECT_EQ(std::vector<std::string>{"Fully Qualified Domain Name"},
-        strs(cs->IdentifyingDescriptions));
-    EXPECT_EQ(1u, log.count("WARN", "No host IP / Name  retrived in the function, So function "
-        "fills localhost for host info."));
+        // The ports name the host the same way.
+        Walk<VESPERA_LANEndpoint> ends(EthernetPortHelper::getEthernetPortHelperObject()->
+            getInstancesByClass(ID_VESPERA_LANEndpoint));
+        ASSERT_EQ(1u, ends.size());
+        EXPECT_EQ(c.name, str(ends[0]->SystemName.value));
+    }
 }
 
 TEST_F(HostTest, LongHostName)
@@ -343,71 +212,52 @@ TEST_F(HostTest, LongHostName)
     // records have room for one character less, and say so.
     std::string name(64, 'h');
     play(LOOPBACK_ONLY, name, { "127.0.0.1" });
-
-    Walk w(common()->getComputerSystemInstances(ID_VESPERA_ComputerSystem));
-    VESPERA_ComputerSystem* cs = host(w);
-    ASSERT_TRUE(cs);
-    EXPECT_EQ(name, str(cs->Name.value));
+    Walk<VESPERA_ComputerSystem> w(common()->getComputerSystemInstances(ID_VESPERA_ComputerSystem));
+    ASSERT_TRUE(host(w));
+    EXPECT_EQ(name, str(host(w)->Name.value));
 
     Log log;
-    Walk ports(EthernetPortHelper::getEthernetPortHelperObject()->getInstancesByClass(
-        ID_VESPERA_EthernetPort));
+    Walk<VESPERA_EthernetPort> ports(EthernetPortHelper::getEthernetPortHelperObject()->
+        getInstancesByClass(ID_VESPERA_EthernetPort));
     ASSERT_EQ(1u, ports.size());
-    EXPECT_EQ(name.substr(0, 63),
-        str(checked_cast<VESPERA_EthernetPort>(ports.all[0])->SystemName.value));
+    EXPECT_EQ(name.substr(0, 63), str(ports[0]->SystemName.value));
     EXPECT_EQ(1u, log.count("WARN", "is longer than 63 characters"));
 }
 
 TEST_F(HostTest, AccessPointWhileTheAgentRuns)
 {
+    typedef Walk<VESPERA_RemoteServiceAccessPoint> Points;
     play(WITH_ADDRESS, "blade7", { "192.168.7.9" });
-
     {
         Log log;
-        Walk none(access()->getInstancesByClass(ID_VESPERA_RemoteServiceAccessPoint));
+        Points none(accessPoints()->getInstancesByClass(ID_VESPERA_RemoteServiceAccessPoint));
         EXPECT_EQ(0u, none.size());
         EXPECT_EQ(1u, log.count("WARN", "The ZARK Agent is not running so no service available"));
-        EXPECT_EQ(0u, log.count("ERR", ""));
     }
 
     Agent agent;
-    ASSERT_EQ(34568u, ProviderUtil::getProviderUtil()->getAgentPort());
-
-    Log log;
-    Walk w(access()->getInstancesByClass(ID_VESPERA_RemoteServiceAccessPoint));
-    ASSERT_EQ(1u, w.size());
-    VESPERA_RemoteServiceAccessPoint* ap =
-        checked_cast<VESPERA_RemoteServiceAccessPoint>(w.all[0]);
-    ASSERT_TRUE(ap);
-    EXPECT_EQ("VESPERA_ComputerSystem", str(ap->SystemCreationClassName.value));
-    EXPECT_EQ("VESPERA_RemoteServiceAccessPoint", str(ap->CreationClassName.value));
-    EXPECT_EQ("192.168.7.9", str(ap->SystemName.value));
-    EXPECT_EQ("ZARK Service", str(ap->Name.value));
-    EXPECT_EQ("Zark Manager Service Access Point", str(ap->ElementName.value));
-    EXPECT_EQ("https://192.168.7.9:34568/index.html", str(ap->AccessInfo.value));
-    EXPECT_EQ(200, ap->InfoFormat.value);
-    EXPECT_EQ(1u, log.count("INFO", "Number of instances: 1"));
-
-    // A host known by name only is reached by that name.
-    play(UNRESOLVED, "blade7");
-    Walk named(access()->getInstancesByClass(ID_VESPERA_RemoteServiceAccessPoint));
-    ASSERT_EQ(1u, named.size());
-    EXPECT_EQ("https://blade7:34568/index.html",
-        str(checked_cast<VESPERA_RemoteServiceAccessPoint>(named.all[0])->AccessInfo.value));
+    ASSERT_TRUE(Agent::running());
+    {
+        Log log;
+        Points w(accessPoints()->getInstancesByClass(ID_VESPERA_RemoteServiceAccessPoint));
+        ASSERT_EQ(1u, w.size());
+        EXPECT_EQ("192.168.7.9", str(w[0]->SystemName.value));
+        EXPECT_EQ("https://192.168.7.9:34568/index.html", str(w[0]->AccessInfo.value));
+        EXPECT_EQ(1u, log.count("INFO", "Number of instances: 1"));
+    }
 
     // "localhost" would send a client to itself: no access point.
     play(NAMELESS, "");
-    Log local;
-    Walk noName(access()->getInstancesByClass(ID_VESPERA_RemoteServiceAccessPoint));
-    EXPECT_EQ(0u, noName.size());
-    EXPECT_EQ(1u, local.count("WARN", "getHostInfo returned localhost"));
+    Log log;
+    Points local(accessPoints()->getInstancesByClass(ID_VESPERA_RemoteServiceAccessPoint));
+    EXPECT_EQ(0u, local.size());
+    EXPECT_EQ(1u, log.count("WARN", "getHostInfo returned localhost"));
 
     // A record whose host name fills its field without a terminator.
     _adapterData data;
     memset(&data, 'h', sizeof(data));
-    VESPERA_RemoteServiceAccessPoint* full = access()->getRemoteServiceAccessPointInstance(data);
+    VESPERA_RemoteServiceAccessPoint* full = accessPoints()->getRemoteServiceAccessPointInstance(data);
     ASSERT_TRUE(full);
-    EXPECT_EQ(std::string(sizeof(data.hostName), 'h'), str(full->SystemName.value));
     EXPECT_EQ("https://" + std::string(sizeof(data.hostName), 'h') + ":34568/index.html",
         str(full->AccessInfo.value));
     destroy(full);
