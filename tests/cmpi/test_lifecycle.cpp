@@ -207,4 +207,25 @@ TEST_F(Lifecycle, DeleteInstanceStatusesAndQuery)
     imi->ft->cleanup(imi, context, 1);
 }
 
+TEST_F(Lifecycle, TheUserComesFromTheRequestsContext)
+{
+    CMPIMethodMI* mmi = create_method_mi(host->broker(), context, nullptr);
+    ASSERT_TRUE(mmi);
+
+    ch::Collector sink;
+    CMPIArgs* out = ch::new_args({});
+    EXPECT_EQ(CMPI_RC_OK, mmi->ft->invokeMethod(mmi, context, ch::new_result(&sink),
+        cmpi_path("u", 1), "Frob", ch::new_args({}), out).rc);
+    EXPECT_TRUE(state->user_ok);
+    EXPECT_STREQ("me", state->user);
+
+    // A context without a principal: no user, and the call goes on.
+    CMPIContext* anonymous = ch::new_context({});
+    EXPECT_EQ(CMPI_RC_OK, mmi->ft->invokeMethod(mmi, anonymous, ch::new_result(&sink),
+        cmpi_path("u", 1), "Frob", ch::new_args({}), out).rc);
+    EXPECT_FALSE(state->user_ok);
+
+    mmi->ft->cleanup(mmi, context, 1);
+}
+
 } // namespace
