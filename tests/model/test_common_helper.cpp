@@ -1,9 +1,8 @@
 // The host's ComputerSystem and the console agent's access point, in the
-// test process. The host's name and addresses come from gethostname and
-// gethostbyname_r, which this executable defines over the C library's, so
-// that each kind of host can be played: one with an IPv4 address, one whose
-// name resolves to loopback only or not at all, and one without a name.
-// Until a test picks a host, both pass through to the real functions.
+// test process. This executable defines gethostname and gethostbyname_r over
+// the C library's, so that a test can play a host of any name and addresses
+// (no name: gethostname fails; no address: the name doesn't resolve). Until
+// a test plays one, both pass through to the real functions.
 
 #include <dlfcn.h>
 #include <errno.h>
@@ -16,20 +15,17 @@
 #include "AccessPointHelper.h"
 #include "CommonHelper.h"
 #include "EthernetPortHelper.h"
-#include "ProviderUtil.h"
 #include "VESPERA_ComputerSystem.h"
 #include "test_ethernet_helper.h"
 
-using namespace OLMA;
+using namespace eth_test;
 
 namespace
 {
 
-enum Played { REAL, WITH_ADDRESS, LOOPBACK_ONLY, UNRESOLVED, NAMELESS };
-
 struct
 {
-    Played kind = REAL;
+    bool on = false;
     std::string name;
     std::vector<std::string> addresses;
 } played;
@@ -38,57 +34,38 @@ struct
 
 extern "C" int gethostname(char* name, size_t len) __THROW
 {
-    if (played.kind == REAL)
-    {
-        typedef int (*Fn)(char*, size_t);
-        static Fn real = (Fn)dlsym(RTLD_NEXT, "gethostname");
+    typedef int (*Fn)(char*, size_t);
+    static Fn real = (Fn)dlsym(RTLD_NEXT, "gethostname");
+    if (!played.on)
         return real(name, len);
-    }
-
-    if (played.kind == NAMELESS)
-    {
-        errno = EFAULT;
-        return -1;
-    }
-
     strncpy(name, played.name.c_str(), len);
-    return 0;
+    return played.name.empty() ? (errno = EFAULT, -1) : 0;
 }
 
-extern "C" int gethostbyname_r(const char* name, struct hostent* ret,
-    char* buf, size_t buflen, struct hostent** result, int* h_errnop)
+extern "C" int gethostbyname_r(const char* name, struct hostent* ret, char* buf, size_t buflen,
+    struct hostent** result, int* h_errnop)
 {
-    if (played.kind == REAL)
-    {
-        typedef int (*Fn)(const char*, struct hostent*, char*, size_t,
-            struct hostent**, int*);
-        static Fn real = (Fn)dlsym(RTLD_NEXT, "gethostbyname_r");
+    typedef int (*Fn)(const char*, struct hostent*, char*, size_t, struct hostent**, int*);
+    static Fn real = (Fn)dlsym(RTLD_NEXT, "gethostbyname_r");
+    if (!played.on)
         return real(name, ret, buf, buflen, result, h_errnop);
-    }
 
     *result = 0;
     size_t n = played.addresses.size();
-
-    if (played.kind == UNRESOLVED || n == 0)
-    {
-        *h_errnop = HOST_NOT_FOUND;
-        return ENOENT;
-    }
-
-    size_t need = (n + 1) * sizeof(char*) + n * sizeof(in_addr) + 1;
-    if (buflen < need)
+    if (n == 0)
+        return *h_errnop = HOST_NOT_FOUND, ENOENT;
+    if (buflen < (n + 1) * sizeof(char*) + n * sizeof(in_addr))
         return ERANGE;
 
+    // The list of pointers, then the addresses they point to.
     char** list = (char**)buf;
-    in_addr* addrs = (in_addr*)(buf + (n + 1) * sizeof(char*));
-
+    in_addr* addrs = (in_addr*)(list + n + 1);
     for (size_t i = 0; i < n; i++)
     {
         inet_pton(AF_INET, played.addresses[i].c_str(), &addrs[i]);
         list[i] = (char*)&addrs[i];
     }
     list[n] = 0;
-
     memset(ret, 0, sizeof(*ret));
     ret->h_name = (char*)name;
     ret->h_aliases = list + n;
@@ -102,26 +79,19 @@ extern "C" int gethostbyname_r(const char* name, struct hostent* ret,
 namespace
 {
 
-using namespace eth_test;
-
 class HostTest : public ::testing::Test
 {
 protected:
     void SetUp() override
     {
         workDir();
-        ASSERT_TRUE(gTrujLibLoaded) << "the start-up didn't load libdtruj.so";
+        ASSERT_TRUE(gTrujLibLoaded);
     }
+    void TearDown() override { played.on = false; }
 
-    void TearDown() override
+    void play(const std::string& name, const std::vector<std::string>& addresses = {})
     {
-        played.kind = REAL;
-    }
-
-    void play(Played kind, const std::string& name,
-        const std::vector<std::string>& addresses = {})
-    {
-        played.kind = kind;
+        played.on = true;
         played.name = name;
         played.addresses = addresses;
     }
@@ -158,26 +128,20 @@ typedef std::vector<std::string> Texts;
 
 TEST_F(HostTest, EachKindOfHost)
 {
-    struct Case
-    {
-        Played kind;
-        std::vector<std::string> addresses;
-        const char* name;
-        const char* nameFormat;
-        const char* description;
-    };
-    // Loopback addresses are passed over; a host without an address is
+    struct Case { const char* played; std::vector<std::string> addresses; const char* name;
+        const char* nameFormat; const char* description; };
+    // Loopback addresses are passed over; a host without another address is
     // named by its plain name, and one without a name is "localhost".
+    const char* const FQDN = "Fully Qualified Domain Name";
     const Case cases[] = {
-        { WITH_ADDRESS, { "127.0.1.1", "10.20.30.40", "10.20.30.41" }, "10.20.30.40", "IP",
-          "Ipv4 Address" },
-        { LOOPBACK_ONLY, { "127.0.0.1", "127.0.1.1" }, "blade7", "Other", "Fully Qualified Domain Name" },
-        { UNRESOLVED, {}, "blade7", "Other", "Fully Qualified Domain Name" },
-        { NAMELESS, {}, "localhost", "Other", "Fully Qualified Domain Name" },
+        { "blade7", { "127.0.1.1", "10.20.30.40", "10.20.30.41" }, "10.20.30.40", "IP", "Ipv4 Address" },
+        { "blade7", { "127.0.0.1", "127.0.1.1" }, "blade7", "Other", FQDN },
+        { "blade7", {}, "blade7", "Other", FQDN },
+        { "", {}, "localhost", "Other", FQDN },
     };
     for (const Case& c : cases)
     {
-        play(c.kind, "blade7", c.addresses);
+        play(c.played, c.addresses);
         Log log;
         Walk<VESPERA_ComputerSystem> w(common()->getComputerSystemInstances(ID_VESPERA_ComputerSystem));
         VESPERA_ComputerSystem* cs = host(w);
@@ -195,7 +159,7 @@ TEST_F(HostTest, EachKindOfHost)
         ASSERT_EQ(1u, cs->OperationalStatus.value.size());
         EXPECT_EQ(2, cs->OperationalStatus.value[0]);
         EXPECT_EQ(Texts{"The System is in service"}, strs(cs->StatusDescriptions));
-        EXPECT_EQ(c.kind == NAMELESS ? 1u : 0u, log.count("WARN", "No host IP / Name  retrived "
+        EXPECT_EQ(c.played[0] ? 0u : 1u, log.count("WARN", "No host IP / Name  retrived "
             "in the function, So function fills localhost for host info."));
 
         // The ports name the host the same way.
@@ -211,7 +175,7 @@ TEST_F(HostTest, LongHostName)
     // The longest name Linux allows. The host keeps it whole; the Ethernet
     // records have room for one character less, and say so.
     std::string name(64, 'h');
-    play(LOOPBACK_ONLY, name, { "127.0.0.1" });
+    play(name, { "127.0.0.1" });
     Walk<VESPERA_ComputerSystem> w(common()->getComputerSystemInstances(ID_VESPERA_ComputerSystem));
     ASSERT_TRUE(host(w));
     EXPECT_EQ(name, str(host(w)->Name.value));
@@ -227,7 +191,7 @@ TEST_F(HostTest, LongHostName)
 TEST_F(HostTest, AccessPointWhileTheAgentRuns)
 {
     typedef Walk<VESPERA_RemoteServiceAccessPoint> Points;
-    play(WITH_ADDRESS, "blade7", { "192.168.7.9" });
+    play("blade7", { "192.168.7.9" });
     {
         Log log;
         Points none(accessPoints()->getInstancesByClass(ID_VESPERA_RemoteServiceAccessPoint));
@@ -247,7 +211,7 @@ TEST_F(HostTest, AccessPointWhileTheAgentRuns)
     }
 
     // "localhost" would send a client to itself: no access point.
-    play(NAMELESS, "");
+    play("");
     Log log;
     Points local(accessPoints()->getInstancesByClass(ID_VESPERA_RemoteServiceAccessPoint));
     EXPECT_EQ(0u, local.size());

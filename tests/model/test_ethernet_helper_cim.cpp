@@ -160,16 +160,18 @@ TEST_F(EthernetCim, HostWithFcHbasOnly)
 
 TEST_F(EthernetCim, FaultsOfAHostDescription)
 {
-    // The first port's details fail once a process; one port has no optics,
-    // one texts of the wrong type, one an over-long name; the second CNA's
-    // port has no link.
+    // In each process the first port's details throw, and so do the optics
+    // of the next; one port has texts of the wrong type, one an over-long
+    // name; the second CNA's port has no link.
     std::string host = writeHost("faults.json", std::string(R"({
-      "faults": { "getEthPortByEthMac": { "kind": "std", "message": "lost", "count": 1 } },
+      "faults": { "getEthPortByEthMac": { "kind": "std", "message": "lost", "count": 1 },
+                  "getOpticsSFP": { "kind": "hba", "code": 6, "message": "no optics", "count": 1 } },
       "adapters": [
       { "hbaData": { "wwn": "20:00:00:05:1e:02:00:00", "hbaMAC": "00:05:1e:02:00:00" },
         "ethPorts": [
           { "mac": "00:05:1e:02:00:01", "ethDev": "eth10" },
-          { "mac": "00:05:1e:02:00:02", "ethDev": "eth11", "ethPortStateMOFValue": 7, "mtu": null },
+          { "mac": "00:05:1e:02:00:02", "ethDev": "eth11", "ethPortStateMOFValue": 7, "mtu": null,
+            "sfp": { "transceiver": "10G_BASE-SR" } },
           { "mac": "00:05:1e:02:00:03", "ethDev": ["eth12"], "ethPortStateMOFValue": "11",
             "sfp": { "transceiver": "10G_BASE-LR" } },
           { "mac": "00:05:1e:02:00:04", "portStatus": false, "mtu": 2000, "ethDev": ")") +
@@ -186,6 +188,7 @@ TEST_F(EthernetCim, FaultsOfAHostDescription)
 
     EXPECT_EQ(1, p["00051e020002"]["PortNumber"].asInt());
     EXPECT_EQ(0, p["00051e020002"]["PortType"].asInt());
+    EXPECT_EQ(1u, count(ports.log, "ERR", "00:05:1e:02:00:02 - libGetOpticsSFP got User exception 6: no optics"));
     EXPECT_EQ(1u, count(ports.log, "ERR", "Unable to get SFP info for 00:05:1e:02:00:02"));
     EXPECT_EQ(list({7}), p["00051e020002"]["OperationalStatus"]);
     EXPECT_EQ("", p["00051e020003"]["ElementName"].asString());
