@@ -295,6 +295,21 @@ TEST_F(AdapterHelperTest, OddAdaptersAreSkipped)
         EXPECT_TRUE(names(ID_VESPERA_PortController).empty());
 }
 
+// The node WWN comes with the storage driver only, so an FC HBA without one
+// has no DeviceID, and one without any driver shows no product data.
+TEST_F(AdapterHelperTest, FcHbaWithoutStorageDriver)
+{
+    Json::Value networkOnly = fcAdapter();
+    networkOnly["driver"] = Json::Value(Json::objectValue);
+    networkOnly["driver"]["networkDriverName"] = "vspreth";
+    serve(one(WWN), {networkOnly});
+    EXPECT_EQ((std::vector<std::string>{""}), names(ID_VESPERA_PortController));
+
+    networkOnly["driver"] = Json::Value(Json::objectValue);
+    serve(one(WWN), {networkOnly});
+    EXPECT_EQ((std::vector<std::string>{"_firmware "}), names(ID_VESPERA_AdapterSoftwareIdentity));
+}
+
 // The builders take records from other helpers too: a field that fills its
 // array is read up to the array's end and no further.
 TEST_F(AdapterHelperTest, RecordsWithoutTerminators)
