@@ -36,7 +36,7 @@ struct Enumeration
     std::string log;
 };
 
-class StandIn : public ::testing::Test
+class AdapterStandIn : public ::testing::Test
 {
 protected:
     void SetUp() override
@@ -117,7 +117,7 @@ typedef std::vector<std::string> Texts;
 // UUID, both drivers, no BIOS)
 //------------------------------------------------------------------------------
 
-TEST_F(StandIn, PortControllers)
+TEST_F(AdapterStandIn, PortControllers)
 {
     Enumeration e = ei("VESPERA_PortController");
     ASSERT_EQ(0, e.rc);
@@ -142,7 +142,7 @@ TEST_F(StandIn, PortControllers)
     EXPECT_EQ(1u, countLines(e.log, "HP VPD info doesnt have the FRU details to print."));
 }
 
-TEST_F(StandIn, PhysicalPackagesAndProducts)
+TEST_F(AdapterStandIn, PhysicalPackagesAndProducts)
 {
     Enumeration e = ei("VESPERA_PhysicalPackage");
     ASSERT_EQ(0, e.rc);
@@ -168,7 +168,7 @@ TEST_F(StandIn, PhysicalPackagesAndProducts)
 }
 
 // Both adapters have the storage driver: it shows once, from the first.
-TEST_F(StandIn, SoftwareIdentities)
+TEST_F(AdapterStandIn, SoftwareIdentities)
 {
     Enumeration e = ei("VESPERA_AdapterSoftwareIdentity");
     ASSERT_EQ(0, e.rc);
@@ -202,7 +202,7 @@ TEST_F(StandIn, SoftwareIdentities)
     }
 }
 
-TEST_F(StandIn, PhysicalConnectors)
+TEST_F(AdapterStandIn, PhysicalConnectors)
 {
     Enumeration e = ei("VESPERA_PhysicalConnector");
     ASSERT_EQ(0, e.rc);
@@ -223,7 +223,7 @@ TEST_F(StandIn, PhysicalConnectors)
 
 // Adapter 1 can't be read: the adapter classes go on with adapter 2, the
 // optics walk ends there.
-TEST_F(StandIn, AdapterWhoseDetailsFail)
+TEST_F(AdapterStandIn, AdapterWhoseDetailsFail)
 {
     useHost(R"({ "faults": { "getHbaByWwn": { "kind": "error", "count": 1 } },
       "adapters": [
@@ -248,7 +248,7 @@ TEST_F(StandIn, AdapterWhoseDetailsFail)
 // Members missing or of the wrong type and texts longer than their fields
 // cost their own values only; so do a port without optics and one whose
 // optics entry throws.
-TEST_F(StandIn, OddRepliesYieldTheOtherElements)
+TEST_F(AdapterStandIn, OddRepliesYieldTheOtherElements)
 {
     const std::string q(2000, 'q');
     useHost(R"({ "faults": { "getOpticsSFP": { "kind": "hba", "count": 1 } },
