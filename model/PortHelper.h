@@ -137,6 +137,13 @@ public:
     // CIM EnabledState of a port state ("portStatusValue" and the like).
     static uint16 getEnabledState(int state);
 
+    static PortHelper* helperObj;
+
+private:
+
+    PortHelper(const PortHelper&);
+    PortHelper& operator=(const PortHelper&);
+
     // Reads the members of a getPortByWwn reply into a zeroed record. The
     // reply is untrusted: missing or mistyped members leave their fields
     // zero, and over-long texts are cut to their field.
@@ -146,13 +153,6 @@ public:
     // Reads a getDynamicPortStatistics reply into a zeroed record.
     static void fillPortStatistics(const Json::Value& reply, bool isFCoE,
         prov_pport_stats_s& stats);
-
-    static PortHelper* helperObj;
-
-private:
-
-    PortHelper(const PortHelper&);
-    PortHelper& operator=(const PortHelper&);
 
     bool _walkAdapter(const String& index, classId_t id, bool byAddress,
         Array<Instance*>& result);
