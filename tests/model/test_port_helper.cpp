@@ -365,4 +365,7 @@ TEST_F(PortHelperTest, LookUpsOfOneAdapterOrPort)
     useDefaultHost();
     EXPECT_EQ(0, helper()->getOpticsInfo("100000051e8a1001", reply));
     EXPECT_EQ("SFP0001A", reply["serialNo"].asString());
+
+    // A CNA is named by its MAC.
+    EXPECT_EQ(1u, Walk(helper()->getFCPortInstancesByAdapter("00051e8b2000")).size());
 }
