@@ -8,7 +8,9 @@
 #include <fstream>
 #include <set>
 #include <string>
+#include <vector>
 #include <gtest/gtest.h>
+#include "Registration.h"
 
 namespace
 {
@@ -99,6 +101,65 @@ TEST(Module, LoadsWithEverySymbolResolved)
             ok = ok || lib.compare(0, strlen(a), a) == 0;
         EXPECT_TRUE(ok) << "needs " << lib;
     }
+}
+
+TEST(Module, RegistrationChainAndDispatch)
+{
+    if (!module_built())
+        GTEST_SKIP() << VSPR_MODULE << " not built";
+
+    void* dl = dlopen(VSPR_MODULE, RTLD_NOW | RTLD_LOCAL);
+    ASSERT_TRUE(dl != nullptr) << dlerror();
+    typedef const OLMA::Registration* (*Module_Proc)();
+    Module_Proc tessel_module = (Module_Proc)dlsym(dl, "tessel_module");
+    ASSERT_TRUE(tessel_module != nullptr);
+
+    // From the last registered to the first.
+    std::vector<const OLMA::Registration*> chain;
+    for (const OLMA::Registration* r = tessel_module(); r && chain.size() < 1000; r = r->next)
+        chain.push_back(r);
+    ASSERT_EQ(76u, chain.size());
+    EXPECT_STREQ("VESPERA_AgentService_Provider", chain.front()->provider_name);
+    EXPECT_STREQ("VESPERA_ComputerSystem_Provider", chain.back()->provider_name);
+
+    for (const OLMA::Registration* r : chain)
+    {
+        EXPECT_STREQ("vsprprovider_Module", r->module_name);
+
+        // Each provider serves the class it is named after.
+        const OLMA::Meta_Class* mc = 0;
+        ASSERT_EQ(0, r->proc(r, OLMA::OP_GET_META_CLASS, &mc, 0, 0, 0, 0, 0, 0, 0));
+        ASSERT_TRUE(mc);
+        EXPECT_EQ(mc, r->meta_class);
+        EXPECT_EQ(std::string(mc->name) + "_Provider", r->provider_name);
+
+        const OLMA::Meta_Repository* mr = 0;
+        ASSERT_EQ(0, r->proc(r, OLMA::OP_GET_REPOSITORY, &mr, 0, 0, 0, 0, 0, 0, 0));
+        EXPECT_EQ(mc->meta_repository, mr);
+
+        // Operations that the class's kind doesn't have, and numbers beyond
+        // the last, give -1 without touching the provider.
+        EXPECT_EQ(-1, r->proc(r, 17, 0, 0, 0, 0, 0, 0, 0, 0)) << r->provider_name;
+        EXPECT_EQ(-1, r->proc(r, -1, 0, 0, 0, 0, 0, 0, 0, 0)) << r->provider_name;
+
+        if (mc->flags & OLMA::FLAG_INDICATION)
+        {
+            for (int op = OLMA::OP_GET_INSTANCE; op <= OLMA::OP_INVOKE_METHOD; op++)
+                EXPECT_EQ(-1, r->proc(r, op, 0, 0, 0, 0, 0, 0, 0, 0)) << op;
+            EXPECT_EQ(-1, r->proc(r, OLMA::OP_ENUM_ASSOCIATORS, 0, 0, 0, 0, 0, 0, 0, 0));
+        }
+        else
+        {
+            EXPECT_EQ(-1, r->proc(r, OLMA::OP_ENABLE_INDICATIONS, 0, 0, 0, 0, 0, 0, 0, 0));
+            EXPECT_EQ(-1, r->proc(r, OLMA::OP_DISABLE_INDICATIONS, 0, 0, 0, 0, 0, 0, 0, 0));
+            if (!(mc->flags & OLMA::FLAG_ASSOCIATION))
+            {
+                EXPECT_EQ(-1, r->proc(r, OLMA::OP_ENUM_REFERENCES, 0, 0, 0, 0, 0, 0, 0, 0));
+            }
+        }
+    }
+
+    dlclose(dl);
 }
 
 } // namespace
