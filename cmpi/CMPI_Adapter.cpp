@@ -257,6 +257,11 @@ extern "C" int tessel_cmpi_adapter(CMPI_Static_Data* data, const Registration* r
     if (!data || !registration || !mi_out)
         return -1;
 
+    // An MI the server never gets is never cleaned up: count only those
+    // that are handed out.
+    if (type != 'I' && type != 'M' && type != 'A' && type != 'N')
+        return -1;
+
     if (!data->adapter)
         new CMPI_Adapter(broker, context, provider_name, registration, data);
     else
