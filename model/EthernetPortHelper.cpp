@@ -155,18 +155,24 @@ void EthernetPortHelper::fillFromEthData(const Json::Value& ethData,
     if (!info)
         return;
 
+    // The caller's record need not be terminated.
+    int macSize = (int)strnlen(info->macAddress, sizeof(info->macAddress));
     const char* dev = _textMember(ethData, "ethDev");
 
     if (dev)
         strlcpy(info->deviceName, dev, sizeof(info->deviceName));
     else
-        TLOG(LL_WARN, "No Ethernet device name for %s", info->macAddress);
+        TLOG(LL_WARN, "No Ethernet device name for %.*s", macSize,
+            info->macAddress);
 
-    if (!_uintMember(ethData, "ethPortStateMOFValue", info->state))
+    // A state goes out as a uint16 of OperationalStatus.
+    if (!_uintMember(ethData, "ethPortStateMOFValue", info->state) ||
+        info->state > 0xFFFF)
     {
         // 0 reads as "Unknown" to a client, which is the truth here.
         info->state = 0;
-        TLOG(LL_WARN, "No Ethernet port state for %s", info->macAddress);
+        TLOG(LL_WARN, "No Ethernet port state for %.*s", macSize,
+            info->macAddress);
     }
 
     // MaxDataSize holds the MTU in bits; an MTU beyond that is no MTU.
