@@ -289,6 +289,21 @@ TEST_F(Providers, SetAlarmStateSwitchesTheBeacon)
         EXPECT_EQ(s.beaconAfter, beacon()) << "state " << s.state;
         EXPECT_EQ(s.beaconAfter ? "3" : "1", alarmState()) << "state " << s.state;
     }
+
+    // A state the beacon can't take is refused before the library is asked.
+    ASSERT_EQ(0, dtruj_sim_set_fault("getPortByWwn", "hba"));
+    LogMark mark;
+    ch::Result r = setAlarm(alarm, 2);
+    ASSERT_EQ(CMPI_RC_OK, r.rc) << r.message;
+    EXPECT_EQ(2u, r.return_value.num.uint32);
+    EXPECT_EQ(1u, countLines(mark.text(), {"ERR: ", "Error: Invalid Input State"}));
+    EXPECT_EQ(0u, countLines(mark.text(), {"libGetPortByWwn"})) << mark.text();
+
+    // A port that can't be read fails the call, but not the request.
+    r = setAlarm(alarm, 3);
+    ASSERT_EQ(CMPI_RC_OK, r.rc) << r.message;
+    EXPECT_EQ(2u, r.return_value.num.uint32);
+    EXPECT_FALSE(beacon());
 }
 
 // A mezzanine card has no beacon, so no alarm device; a client that asks
