@@ -1,4 +1,5 @@
 #include "ProviderUtil.h"
+#include "EthernetPortHelper.h"
 
 #include <errno.h>
 #include <netdb.h>
@@ -896,6 +897,26 @@ unsigned int ProviderUtil::getAdapterId(String address)
 
     TLOG(LL_ERR, "The address passed is not MAC or WWN");
     return (unsigned int)-1;
+}
+
+} // namespace OLMA
+
+namespace OLMA
+{
+
+String ProviderUtil::getEthDeviceNameByMAC(String mac)
+{
+    Json::Value reply;
+
+    if (EthernetPortHelper::getEthernetPortHelperObject()->getEthPortDetails(mac, reply) == 0)
+    {
+        const Json::Value& dev = reply["ethData"]["ethDev"];
+        if (dev.isString())
+            return String(dev.asCString());
+    }
+
+    TLOG(LL_ERR, "Unable to get Eth Device Name for %s", mac.c_str());
+    return String();
 }
 
 } // namespace OLMA

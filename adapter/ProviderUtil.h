@@ -93,6 +93,10 @@ public:
     bool hasEthernetPort(String index);
     String getDriverVersion();
 
+    // "ethDev" of the Ethernet port named by mac (either text form); empty,
+    // after an ERR line, when the port can't be read.
+    String getEthDeviceNameByMAC(String mac);
+
     // The library's adapter id, or (unsigned)-1.
     unsigned int getAdapterIdByIndexStr(String index);
     unsigned int getAdapterIdByMacAddr(String mac);

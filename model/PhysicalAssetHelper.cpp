@@ -42,7 +42,10 @@ static void _fillSfpInfo(const Json::Value& optics, int adapterId, int portPlace
 
     // Serial numbers of optics repeat across vendors; the place of the port
     // keeps the tag unique within the host.
-    snprintf(sfp.tag, sizeof(sfp.tag), "%s_%d_%d", sfp.serialNumber, adapterId, portPlace);
+    int n = snprintf(sfp.tag, sizeof(sfp.tag), "%s_%d_%d", sfp.serialNumber, adapterId, portPlace);
+    if (n < 0 || (size_t)n >= sizeof(sfp.tag))
+        TLOG(LL_WARN, "Connector tag of adapter %d port %d cut to %zu characters",
+            adapterId, portPlace, sizeof(sfp.tag) - 1);
 }
 
 Array<Instance*> PhysicalAssetHelper::getInstancesByClass(classId_t id)

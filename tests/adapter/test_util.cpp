@@ -241,6 +241,14 @@ TEST_F(Util, AdapterLookUps)
     EXPECT_TRUE(util()->checkIfThisAdapterModelPresent("vespera-1860"));
     EXPECT_TRUE(util()->checkIfThisAdapterModelPresent("VESPERA-1020-Rev2"));
     EXPECT_FALSE(util()->checkIfThisAdapterModelPresent("Vespera-10"));
+
+    // The Ethernet device name, by either address form; an unknown port
+    // gives an empty name and says so.
+    EXPECT_EQ("eth2", str(util()->getEthDeviceNameByMAC("00:05:1e:8b:20:02")));
+    EXPECT_EQ("eth2", str(util()->getEthDeviceNameByMAC("00051e8b2002")));
+    EXPECT_EQ("", str(util()->getEthDeviceNameByMAC("00051e8b2099")));
+    EXPECT_EQ(1u, countLines(log.text(),
+        {"ERR: ", "Unable to get Eth Device Name for 00051e8b2099"}));
 }
 
 TEST_F(Util, AdapterDetailsAskByWwnOrMac)
