@@ -297,7 +297,7 @@ CMPIStatus b_attach(const CMPIBroker* mb, const CMPIContext* ctx)
     return status(CMPI_RC_OK);
 }
 
-CMPIStatus b_detach(const CMPIBroker* mb, const CMPIContext*)
+CMPIStatus b_detach(const CMPIBroker* mb, const CMPIContext* ctx)
 {
     if (!host_of(mb))
         return status(CMPI_RC_ERR_INVALID_HANDLE);
@@ -308,6 +308,10 @@ CMPIStatus b_detach(const CMPIBroker* mb, const CMPIContext*)
     pop_arena();
     free_arena(a);
     delete a;
+    // The context that prepareAttachThread made for this thread ends with
+    // it, as the standard has it: a provider never releases it itself.
+    if (obj_cast<Ctx_Obj>(ctx, K_CONTEXT))
+        release_obj(ctx);
     return status(CMPI_RC_OK);
 }
 
