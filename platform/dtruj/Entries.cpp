@@ -748,7 +748,9 @@ JSON_ENTRY(getAdapterPciFnData)
     return r;
 }
 
-JSON_ENTRY(getFcPhyPortIndicesByAdapter)
+// The index strings of one kind of physical port of the adapter a request names.
+static Json::Value portIndices(State& s, const Json::Value& req, const char* ports,
+                               const char* address)
 {
     std::string addr = firstOf(req, {"indexStr", "wwn", "mac"});
     Json::Value* a = findAdapter(s, addr);
@@ -756,22 +758,19 @@ JSON_ENTRY(getFcPhyPortIndicesByAdapter)
         return notFound("adapter", addr);
     Json::Value r(Json::objectValue);
     r["indexStrings"] = Json::Value(Json::arrayValue);
-    for (const Json::Value& p : (*a)["fcPorts"])
-        r["indexStrings"].append(p["wwn"]);
+    for (const Json::Value& p : (*a)[ports])
+        r["indexStrings"].append(p[address]);
     return r;
+}
+
+JSON_ENTRY(getFcPhyPortIndicesByAdapter)
+{
+    return portIndices(s, req, "fcPorts", "wwn");
 }
 
 JSON_ENTRY(getEthPhyPortIndicesByAdapter)
 {
-    std::string addr = firstOf(req, {"indexStr", "wwn", "mac"});
-    Json::Value* a = findAdapter(s, addr);
-    if (!a)
-        return notFound("adapter", addr);
-    Json::Value r(Json::objectValue);
-    r["indexStrings"] = Json::Value(Json::arrayValue);
-    for (const Json::Value& p : (*a)["ethPorts"])
-        r["indexStrings"].append(p["mac"]);
-    return r;
+    return portIndices(s, req, "ethPorts", "mac");
 }
 
 // ---------------------------------------------------------------- flash
