@@ -187,13 +187,16 @@ def is_out(p):
     return bool(p.flags & gen_schema.F_OUT)
 
 
+def param_type(p):
+    """The type of the provider member's parameter for p."""
+    if p.kind == "reference" and not p.subscript:
+        return ("%s*&" if is_out(p) else "const %s*") % p.type
+    return ("%s&" if is_out(p) else "const %s&") % slot_type(p)
+
+
 def param_decl(p):
     """The provider member's parameter for p."""
-    t = slot_type(p)
-    if p.kind == "reference" and not p.subscript:
-        base = p.type
-        return ("%s*& %s" % (base, p.member)) if is_out(p) else ("const %s* %s" % (base, p.member))
-    return ("%s& %s" % (t, p.member)) if is_out(p) else ("const %s& %s" % (t, p.member))
+    return "%s %s" % (param_type(p), p.member)
 
 
 KIND_FLAGS = {"C": gen_schema.F_CLASS, "A": gen_schema.F_ASSOCIATION,
@@ -237,9 +240,15 @@ def gen_cpp(provs):
     a('#include "Dispatch.h"\n')
     a('#include "CMPI_Adapter.h"\n')
     for p in provs:
+        a('#include "%s.h"\n' % p["cls"])
         a('#include "%s_Provider.h"\n' % p["cls"])
     a("\nnamespace OLMA\n{\n\n")
     a('static const char _tessel_module_name[] = "vsprprovider_Module";\n\n')
+    a("// A provider declares only the extrinsic methods it implements; the\n"
+      "// others answer INVOKE_METHOD_UNSUPPORTED.\n")
+    for name in sorted({m.name for p in provs for m in p["methods"]}):
+        a("TESSEL_PROVIDER_MEMBER(%s);\n" % name)
+    a("\n")
     prev = "0"
     for p in provs:
         cls = p["cls"]
@@ -255,8 +264,12 @@ def gen_cpp(provs):
                 a("        // Only the class's own record has the layout cast to here.\n")
                 a("        if (!__is_record<%s>(method))\n            return -1;\n" % rec)
                 a("        %s* m = (%s*)method;\n" % (rec, rec))
+                sig = ", ".join(["const %s*" % cls] + [param_type(q) for q in m.params])
                 args = ", ".join(["self"] + ["m->%s" % q.member for q in m.params])
-                a("        return provider->%s(%s);\n    }\n" % (m.name, args))
+                a("        return __call_member<__member_%s<%s,\n"
+                  "            Invoke_Method_Status(%s)> >(\n"
+                  "            provider, INVOKE_METHOD_UNSUPPORTED, %s);\n    }\n"
+                  % (m.name, prov, sig, args))
             a("\n    return -1;\n}\n\n")
         a("extern \"C\" sint32 __tessel_%s_proc(\n    const Registration* registration, int operation,\n"
           "    void* arg0, void* arg1, void* arg2, void* arg3,\n"
