@@ -1,9 +1,14 @@
 #!/usr/bin/env python3
 """Generates the provider glue of the module: for each provider its dispatch
 function, its Registration record and its exported CMPI entries, plus the
-linker version script and the list of exported names.
+linker version script and the list of exported names; and the test that
+calls every operation and method of every provider through its dispatch.
 
-    tools/gen_providers.py [--schema DIR] [--out-dir DIR] [--check]
+    tools/gen_providers.py [--schema DIR] [--out-dir DIR] [--tests-dir DIR] [--check]
+
+A dispatch function calls only the members that its provider class declares
+(cmpi/Dispatch.h finds them at compile time); the generated code names every
+method the class model gives, whether the provider has it or not.
 
 The providers, their order and kinds are the tables below; the extrinsic
 methods and their parameters come from the class model that
