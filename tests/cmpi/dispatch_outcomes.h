@@ -114,7 +114,8 @@ public:
 
     explicit Calls(const Case& c) : _case(c)
     {
-        _log_path();
+        // Moves the log to a private HOME before the first call.
+        adapter_test::InProcessLog::path();
         sint32 status = c.proc(0, OP_GET_META_CLASS, &_meta_class, 0, 0, 0, 0, 0, 0, 0);
         EXPECT_EQ(0, status);
         status = c.proc(0, OP_CREATE_PROVIDER, &_provider, 0, 0, 0, 0, 0, 0, 0);
@@ -285,11 +286,6 @@ private:
     static bool _entered(const adapter_test::InProcessLog& log, const std::string& op)
     {
         return adapter_test::countLines(log.text(), { "Entering: " + op }) > 0;
-    }
-
-    static void _log_path()
-    {
-        adapter_test::InProcessLog::path();
     }
 
     const Case& _case;
