@@ -2,10 +2,20 @@
 
 # vspr_subsystem(NAME [LIBS ...]): a static, position-independent library
 # vspr_NAME from every .cpp in the calling directory. It joins the provider
-# module (whole archive, so that static registrations are kept).
+# module (whole archive, so that static registrations are kept). A directory
+# of headers only (providers that implement nothing yet) gives an interface
+# library, which has nothing to join.
 function(vspr_subsystem name)
   cmake_parse_arguments(ARG "" "" "LIBS" ${ARGN})
   file(GLOB srcs CONFIGURE_DEPENDS "${CMAKE_CURRENT_SOURCE_DIR}/*.cpp")
+  if(NOT srcs)
+    add_library(vspr_${name} INTERFACE)
+    target_include_directories(vspr_${name} INTERFACE "${CMAKE_CURRENT_SOURCE_DIR}")
+    if(ARG_LIBS)
+      target_link_libraries(vspr_${name} INTERFACE ${ARG_LIBS})
+    endif()
+    return()
+  endif()
   add_library(vspr_${name} STATIC ${srcs})
   target_include_directories(vspr_${name} PUBLIC "${CMAKE_CURRENT_SOURCE_DIR}")
   target_compile_options(vspr_${name} PRIVATE -fvisibility=hidden -fvisibility-inlines-hidden)

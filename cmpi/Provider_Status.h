@@ -3,7 +3,9 @@
 
 // The results of the provider members. The numbers are the contract between
 // the dispatch functions and the CMPI adapter, which maps them to CMPI return
-// codes; a member that a provider doesn't implement returns ..._UNSUPPORTED.
+// codes; for a member that a provider doesn't declare, its dispatch function
+// answers ..._UNSUPPORTED (Dispatch.h tells what it answers where an enum has
+// no such value).
 
 namespace OLMA
 {

@@ -13,16 +13,6 @@ VESPERA_AlertIndication_Provider::~VESPERA_AlertIndication_Provider()
     delete _handler;
 }
 
-Load_Status VESPERA_AlertIndication_Provider::load()
-{
-    return LOAD_OK;
-}
-
-Unload_Status VESPERA_AlertIndication_Provider::unload()
-{
-    return UNLOAD_OK;
-}
-
 Enable_Indications_Status VESPERA_AlertIndication_Provider::enable_indications(Indication_Handler<VESPERA_AlertIndication>* handler)
 {
     delete _handler;

@@ -17,10 +17,6 @@ public:
 
     ~VESPERA_AlertIndication_Provider();
 
-    Load_Status load();
-
-    Unload_Status unload();
-
     Enable_Indications_Status enable_indications(Indication_Handler<VESPERA_AlertIndication>* handler);
 
     Disable_Indications_Status disable_indications();

@@ -1,9 +1,6 @@
 #ifndef _VESPERA_HostedLANEndpoint_Provider_h
 #define _VESPERA_HostedLANEndpoint_Provider_h
 
-#include "Provider.h"
-#include "VESPERA_HostedLANEndpoint.h"
-
 namespace OLMA
 {
 
@@ -11,37 +8,6 @@ namespace OLMA
 // supports no other operation.
 class VESPERA_HostedLANEndpoint_Provider
 {
-public:
-
-    VESPERA_HostedLANEndpoint_Provider();
-
-    ~VESPERA_HostedLANEndpoint_Provider();
-
-    Load_Status load();
-
-    Unload_Status unload();
-
-    Get_Instance_Status get_instance(const VESPERA_HostedLANEndpoint* model, VESPERA_HostedLANEndpoint*& instance);
-
-    Enum_Instances_Status enum_instances(
-        const VESPERA_HostedLANEndpoint* model, Enum_Instances_Handler<VESPERA_HostedLANEndpoint>* handler);
-
-    Create_Instance_Status create_instance(VESPERA_HostedLANEndpoint* instance);
-
-    Delete_Instance_Status delete_instance(const VESPERA_HostedLANEndpoint* instance);
-
-    Modify_Instance_Status modify_instance(const VESPERA_HostedLANEndpoint* model, const VESPERA_HostedLANEndpoint* instance);
-
-    Enum_Associator_Names_Status enum_associator_names(const Instance* instance,
-        const String& result_class, const String& role, const String& result_role,
-        Enum_Associator_Names_Handler<Instance>* handler);
-
-    Enum_Associators_Status enum_associators(const Instance* instance,
-        const String& result_class, const String& role, const String& result_role,
-        Enum_Associators_Handler<Instance>* handler);
-
-    Enum_References_Status enum_references(const Instance* instance,
-        const VESPERA_HostedLANEndpoint* model, const String& role, Enum_References_Handler<VESPERA_HostedLANEndpoint>* handler);
 };
 
 } // namespace OLMA

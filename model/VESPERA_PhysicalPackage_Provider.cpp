@@ -7,29 +7,6 @@
 namespace OLMA
 {
 
-VESPERA_PhysicalPackage_Provider::VESPERA_PhysicalPackage_Provider()
-{
-}
-
-VESPERA_PhysicalPackage_Provider::~VESPERA_PhysicalPackage_Provider()
-{
-}
-
-Load_Status VESPERA_PhysicalPackage_Provider::load()
-{
-    return LOAD_OK;
-}
-
-Unload_Status VESPERA_PhysicalPackage_Provider::unload()
-{
-    return UNLOAD_OK;
-}
-
-Get_Instance_Status VESPERA_PhysicalPackage_Provider::get_instance(const VESPERA_PhysicalPackage*, VESPERA_PhysicalPackage*&)
-{
-    return GET_INSTANCE_UNSUPPORTED;
-}
-
 Enum_Instances_Status VESPERA_PhysicalPackage_Provider::enum_instances(
     const VESPERA_PhysicalPackage*, Enum_Instances_Handler<VESPERA_PhysicalPackage>* handler)
 {
@@ -50,29 +27,6 @@ Enum_Instances_Status VESPERA_PhysicalPackage_Provider::enum_instances(
 
     TLOG(LL_DBG, "Returning: %s", "enum_instances");
     return ENUM_INSTANCES_OK;
-}
-
-Create_Instance_Status VESPERA_PhysicalPackage_Provider::create_instance(VESPERA_PhysicalPackage*)
-{
-    return CREATE_INSTANCE_UNSUPPORTED;
-}
-
-Delete_Instance_Status VESPERA_PhysicalPackage_Provider::delete_instance(const VESPERA_PhysicalPackage*)
-{
-    return DELETE_INSTANCE_UNSUPPORTED;
-}
-
-Modify_Instance_Status VESPERA_PhysicalPackage_Provider::modify_instance(const VESPERA_PhysicalPackage*, const VESPERA_PhysicalPackage*)
-{
-    return MODIFY_INSTANCE_UNSUPPORTED;
-}
-
-Invoke_Method_Status VESPERA_PhysicalPackage_Provider::IsCompatible(
-    const VESPERA_PhysicalPackage*,
-    const CIM_PhysicalElement*,
-    Property<uint32>&)
-{
-    return INVOKE_METHOD_UNSUPPORTED;
 }
 
 } // namespace OLMA

@@ -7,29 +7,6 @@
 namespace OLMA
 {
 
-VESPERA_RemoteServiceAccessPoint_Provider::VESPERA_RemoteServiceAccessPoint_Provider()
-{
-}
-
-VESPERA_RemoteServiceAccessPoint_Provider::~VESPERA_RemoteServiceAccessPoint_Provider()
-{
-}
-
-Load_Status VESPERA_RemoteServiceAccessPoint_Provider::load()
-{
-    return LOAD_OK;
-}
-
-Unload_Status VESPERA_RemoteServiceAccessPoint_Provider::unload()
-{
-    return UNLOAD_OK;
-}
-
-Get_Instance_Status VESPERA_RemoteServiceAccessPoint_Provider::get_instance(const VESPERA_RemoteServiceAccessPoint*, VESPERA_RemoteServiceAccessPoint*&)
-{
-    return GET_INSTANCE_UNSUPPORTED;
-}
-
 Enum_Instances_Status VESPERA_RemoteServiceAccessPoint_Provider::enum_instances(
     const VESPERA_RemoteServiceAccessPoint*, Enum_Instances_Handler<VESPERA_RemoteServiceAccessPoint>* handler)
 {
@@ -58,31 +35,6 @@ Enum_Instances_Status VESPERA_RemoteServiceAccessPoint_Provider::enum_instances(
 
     TLOG(LL_DBG, "Returning: %s", "enum_instances");
     return ENUM_INSTANCES_OK;
-}
-
-Create_Instance_Status VESPERA_RemoteServiceAccessPoint_Provider::create_instance(VESPERA_RemoteServiceAccessPoint*)
-{
-    return CREATE_INSTANCE_UNSUPPORTED;
-}
-
-Delete_Instance_Status VESPERA_RemoteServiceAccessPoint_Provider::delete_instance(const VESPERA_RemoteServiceAccessPoint*)
-{
-    return DELETE_INSTANCE_UNSUPPORTED;
-}
-
-Modify_Instance_Status VESPERA_RemoteServiceAccessPoint_Provider::modify_instance(const VESPERA_RemoteServiceAccessPoint*, const VESPERA_RemoteServiceAccessPoint*)
-{
-    return MODIFY_INSTANCE_UNSUPPORTED;
-}
-
-Invoke_Method_Status VESPERA_RemoteServiceAccessPoint_Provider::RequestStateChange(
-    const VESPERA_RemoteServiceAccessPoint*,
-    const Property<uint16>&,
-    CIM_ConcreteJob*&,
-    const Property<Datetime>&,
-    Property<uint32>&)
-{
-    return INVOKE_METHOD_UNSUPPORTED;
 }
 
 } // namespace OLMA

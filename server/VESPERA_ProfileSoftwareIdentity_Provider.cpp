@@ -4,29 +4,6 @@
 namespace OLMA
 {
 
-VESPERA_ProfileSoftwareIdentity_Provider::VESPERA_ProfileSoftwareIdentity_Provider()
-{
-}
-
-VESPERA_ProfileSoftwareIdentity_Provider::~VESPERA_ProfileSoftwareIdentity_Provider()
-{
-}
-
-Load_Status VESPERA_ProfileSoftwareIdentity_Provider::load()
-{
-    return LOAD_OK;
-}
-
-Unload_Status VESPERA_ProfileSoftwareIdentity_Provider::unload()
-{
-    return UNLOAD_OK;
-}
-
-Get_Instance_Status VESPERA_ProfileSoftwareIdentity_Provider::get_instance(const VESPERA_ProfileSoftwareIdentity*, VESPERA_ProfileSoftwareIdentity*&)
-{
-    return GET_INSTANCE_UNSUPPORTED;
-}
-
 Enum_Instances_Status VESPERA_ProfileSoftwareIdentity_Provider::enum_instances(
     const VESPERA_ProfileSoftwareIdentity*, Enum_Instances_Handler<VESPERA_ProfileSoftwareIdentity>* handler)
 {
@@ -42,21 +19,6 @@ Enum_Instances_Status VESPERA_ProfileSoftwareIdentity_Provider::enum_instances(
     }
     TLOG(LL_DBG, "Returning: %s", "enum_instances");
     return ENUM_INSTANCES_OK;
-}
-
-Create_Instance_Status VESPERA_ProfileSoftwareIdentity_Provider::create_instance(VESPERA_ProfileSoftwareIdentity*)
-{
-    return CREATE_INSTANCE_UNSUPPORTED;
-}
-
-Delete_Instance_Status VESPERA_ProfileSoftwareIdentity_Provider::delete_instance(const VESPERA_ProfileSoftwareIdentity*)
-{
-    return DELETE_INSTANCE_UNSUPPORTED;
-}
-
-Modify_Instance_Status VESPERA_ProfileSoftwareIdentity_Provider::modify_instance(const VESPERA_ProfileSoftwareIdentity*, const VESPERA_ProfileSoftwareIdentity*)
-{
-    return MODIFY_INSTANCE_UNSUPPORTED;
 }
 
 } // namespace OLMA

@@ -3,87 +3,201 @@
 #include <strings.h>
 #include "Dispatch.h"
 #include "CMPI_Adapter.h"
+#include "VESPERA_ComputerSystem.h"
 #include "VESPERA_ComputerSystem_Provider.h"
+#include "VESPERA_PortController.h"
 #include "VESPERA_PortController_Provider.h"
+#include "VESPERA_FCPort.h"
 #include "VESPERA_FCPort_Provider.h"
+#include "VESPERA_FCPortStatistics.h"
 #include "VESPERA_FCPortStatistics_Provider.h"
+#include "VESPERA_AdapterSoftwareIdentity.h"
 #include "VESPERA_AdapterSoftwareIdentity_Provider.h"
+#include "VESPERA_PhysicalPackage.h"
 #include "VESPERA_PhysicalPackage_Provider.h"
+#include "VESPERA_Product.h"
 #include "VESPERA_Product_Provider.h"
+#include "VESPERA_SCSIProtocolEndpoint.h"
 #include "VESPERA_SCSIProtocolEndpoint_Provider.h"
+#include "VESPERA_ElementStatisticalData.h"
 #include "VESPERA_ElementStatisticalData_Provider.h"
+#include "VESPERA_ControlledBy.h"
 #include "VESPERA_ControlledBy_Provider.h"
+#include "VESPERA_AdapterElementSoftwareIdentity.h"
 #include "VESPERA_AdapterElementSoftwareIdentity_Provider.h"
+#include "VESPERA_Realizes.h"
 #include "VESPERA_Realizes_Provider.h"
+#include "VESPERA_ProductPhysicalComponent.h"
 #include "VESPERA_ProductPhysicalComponent_Provider.h"
+#include "VESPERA_FCPortSystemDevice.h"
 #include "VESPERA_FCPortSystemDevice_Provider.h"
+#include "VESPERA_PortControllerSystemDevice.h"
 #include "VESPERA_PortControllerSystemDevice_Provider.h"
+#include "VESPERA_HostedAccessPoint.h"
 #include "VESPERA_HostedAccessPoint_Provider.h"
+#include "VESPERA_DeviceSAPImplementation.h"
 #include "VESPERA_DeviceSAPImplementation_Provider.h"
+#include "VESPERA_InstalledSoftwareIdentity.h"
 #include "VESPERA_InstalledSoftwareIdentity_Provider.h"
+#include "VESPERA_ObjectManager.h"
 #include "VESPERA_ObjectManager_Provider.h"
+#include "VESPERA_Namespace.h"
 #include "VESPERA_Namespace_Provider.h"
+#include "VESPERA_CIMXMLCommunicationMechanism.h"
 #include "VESPERA_CIMXMLCommunicationMechanism_Provider.h"
+#include "VESPERA_CommMechanismForManager.h"
 #include "VESPERA_CommMechanismForManager_Provider.h"
+#include "VESPERA_NamespaceInManager.h"
 #include "VESPERA_NamespaceInManager_Provider.h"
+#include "VESPERA_ObjectManagerHostedService.h"
 #include "VESPERA_ObjectManagerHostedService_Provider.h"
+#include "VESPERA_CommMechHostedAccessPoint.h"
 #include "VESPERA_CommMechHostedAccessPoint_Provider.h"
+#include "VESPERA_RegisteredProfile.h"
 #include "VESPERA_RegisteredProfile_Provider.h"
+#include "VESPERA_RegisteredSubProfile.h"
 #include "VESPERA_RegisteredSubProfile_Provider.h"
+#include "VESPERA_ProfileSoftwareIdentity.h"
 #include "VESPERA_ProfileSoftwareIdentity_Provider.h"
+#include "VESPERA_ElementConformsToProfile.h"
 #include "VESPERA_ElementConformsToProfile_Provider.h"
+#include "VESPERA_ProfileElementSoftwareIdentity.h"
 #include "VESPERA_ProfileElementSoftwareIdentity_Provider.h"
+#include "VESPERA_SubProfileRequiresProfile.h"
 #include "VESPERA_SubProfileRequiresProfile_Provider.h"
+#include "VESPERA_LogicalDisk.h"
 #include "VESPERA_LogicalDisk_Provider.h"
+#include "VESPERA_StorageExtent.h"
 #include "VESPERA_StorageExtent_Provider.h"
+#include "VESPERA_TapeDrive.h"
 #include "VESPERA_TapeDrive_Provider.h"
+#include "VESPERA_StorageResourcesSystemDevice.h"
 #include "VESPERA_StorageResourcesSystemDevice_Provider.h"
+#include "VESPERA_RemoteServiceAccessPoint.h"
 #include "VESPERA_RemoteServiceAccessPoint_Provider.h"
+#include "VESPERA_RemoteServiceHostedAccessPoint.h"
 #include "VESPERA_RemoteServiceHostedAccessPoint_Provider.h"
+#include "VESPERA_HBASoftwareInstallationService.h"
 #include "VESPERA_HBASoftwareInstallationService_Provider.h"
+#include "VESPERA_HBASoftwareInstallationServiceCapabilities.h"
 #include "VESPERA_HBASoftwareInstallationServiceCapabilities_Provider.h"
+#include "VESPERA_HBASoftwareInstallationServiceHostedService.h"
 #include "VESPERA_HBASoftwareInstallationServiceHostedService_Provider.h"
+#include "VESPERA_HBASoftwareInstallationServiceElementCapabilities.h"
 #include "VESPERA_HBASoftwareInstallationServiceElementCapabilities_Provider.h"
+#include "VESPERA_EthernetPort.h"
 #include "VESPERA_EthernetPort_Provider.h"
+#include "VESPERA_EthernetPortSystemDevice.h"
 #include "VESPERA_EthernetPortSystemDevice_Provider.h"
+#include "VESPERA_EthernetPortControlledBy.h"
 #include "VESPERA_EthernetPortControlledBy_Provider.h"
+#include "VESPERA_ProductElementComponent.h"
 #include "VESPERA_ProductElementComponent_Provider.h"
+#include "VESPERA_AlertIndication.h"
 #include "VESPERA_AlertIndication_Provider.h"
+#include "VESPERA_MemoryDiagnosticTest.h"
 #include "VESPERA_MemoryDiagnosticTest_Provider.h"
+#include "VESPERA_LoopbackDiagnosticTest.h"
 #include "VESPERA_LoopbackDiagnosticTest_Provider.h"
+#include "VESPERA_PCILoopbackDiagnosticTest.h"
 #include "VESPERA_PCILoopbackDiagnosticTest_Provider.h"
+#include "VESPERA_EthLoopbackDiagnosticTest.h"
 #include "VESPERA_EthLoopbackDiagnosticTest_Provider.h"
+#include "VESPERA_DiagnosticSoftwareIdentity.h"
 #include "VESPERA_DiagnosticSoftwareIdentity_Provider.h"
+#include "VESPERA_ConcreteJob.h"
 #include "VESPERA_ConcreteJob_Provider.h"
+#include "VESPERA_DiagnosticServiceRecord.h"
 #include "VESPERA_DiagnosticServiceRecord_Provider.h"
+#include "VESPERA_DiagnosticCompletionRecord.h"
 #include "VESPERA_DiagnosticCompletionRecord_Provider.h"
+#include "VESPERA_DiagnosticElementSoftwareIdentity.h"
 #include "VESPERA_DiagnosticElementSoftwareIdentity_Provider.h"
+#include "VESPERA_OwningJobElement.h"
 #include "VESPERA_OwningJobElement_Provider.h"
+#include "VESPERA_AffectedJobElement.h"
 #include "VESPERA_AffectedJobElement_Provider.h"
+#include "VESPERA_AvailableDiagnosticServiceForAdapter.h"
 #include "VESPERA_AvailableDiagnosticServiceForAdapter_Provider.h"
+#include "VESPERA_AvailableDiagnosticServiceForFCPort.h"
 #include "VESPERA_AvailableDiagnosticServiceForFCPort_Provider.h"
+#include "VESPERA_AvailableDiagnosticServiceForEthernetPort.h"
 #include "VESPERA_AvailableDiagnosticServiceForEthernetPort_Provider.h"
+#include "VESPERA_ServiceRecordAppliesToElement.h"
 #include "VESPERA_ServiceRecordAppliesToElement_Provider.h"
+#include "VESPERA_CompletionRecordAppliesToElement.h"
 #include "VESPERA_CompletionRecordAppliesToElement_Provider.h"
+#include "VESPERA_LogicalPortGroup.h"
 #include "VESPERA_LogicalPortGroup_Provider.h"
+#include "VESPERA_MemberOfCollection.h"
 #include "VESPERA_MemberOfCollection_Provider.h"
+#include "VESPERA_HostedCollection.h"
 #include "VESPERA_HostedCollection_Provider.h"
+#include "VESPERA_HostedDependency.h"
 #include "VESPERA_HostedDependency_Provider.h"
+#include "VESPERA_PhysicalConnector.h"
 #include "VESPERA_PhysicalConnector_Provider.h"
+#include "VESPERA_EthernetPortRealizes.h"
 #include "VESPERA_EthernetPortRealizes_Provider.h"
+#include "VESPERA_PhysicalConnectorContainer.h"
 #include "VESPERA_PhysicalConnectorContainer_Provider.h"
+#include "VESPERA_LANEndpoint.h"
 #include "VESPERA_LANEndpoint_Provider.h"
+#include "VESPERA_LANEndpointDeviceSAPImplementation.h"
 #include "VESPERA_LANEndpointDeviceSAPImplementation_Provider.h"
+#include "VESPERA_HostedLANEndpoint.h"
 #include "VESPERA_HostedLANEndpoint_Provider.h"
+#include "VESPERA_AlarmDevice.h"
 #include "VESPERA_AlarmDevice_Provider.h"
+#include "VESPERA_AssociatedAlarm.h"
 #include "VESPERA_AssociatedAlarm_Provider.h"
+#include "VESPERA_SCSIInitiatorTargetLogicalUnitPath.h"
 #include "VESPERA_SCSIInitiatorTargetLogicalUnitPath_Provider.h"
+#include "VESPERA_AgentService.h"
 #include "VESPERA_AgentService_Provider.h"
 
 namespace OLMA
 {
 
 static const char _tessel_module_name[] = "vsprprovider_Module";
+
+// A provider declares only the extrinsic methods it implements; the
+// others answer INVOKE_METHOD_UNSUPPORTED.
+TESSEL_PROVIDER_MEMBER(BroadcastReset);
+TESSEL_PROVIDER_MEMBER(ChangeAffectedElementsAssignedSequence);
+TESSEL_PROVIDER_MEMBER(CheckSoftwareIdentity);
+TESSEL_PROVIDER_MEMBER(ClearResults);
+TESSEL_PROVIDER_MEMBER(CloseConformantInstances);
+TESSEL_PROVIDER_MEMBER(CreateGoalSettings);
+TESSEL_PROVIDER_MEMBER(DiscontinueTest);
+TESSEL_PROVIDER_MEMBER(EnableDevice);
+TESSEL_PROVIDER_MEMBER(GetError);
+TESSEL_PROVIDER_MEMBER(GetErrors);
+TESSEL_PROVIDER_MEMBER(InstallFromByteStream);
+TESSEL_PROVIDER_MEMBER(InstallFromSoftwareIdentity);
+TESSEL_PROVIDER_MEMBER(InstallFromURI);
+TESSEL_PROVIDER_MEMBER(IsCompatible);
+TESSEL_PROVIDER_MEMBER(KillJob);
+TESSEL_PROVIDER_MEMBER(LockMedia);
+TESSEL_PROVIDER_MEMBER(OnlineDevice);
+TESSEL_PROVIDER_MEMBER(OpenConformantInstances);
+TESSEL_PROVIDER_MEMBER(PullConformantInstances);
+TESSEL_PROVIDER_MEMBER(QuiesceDevice);
+TESSEL_PROVIDER_MEMBER(RequestStateChange);
+TESSEL_PROVIDER_MEMBER(Reset);
+TESSEL_PROVIDER_MEMBER(ResetSelectedStats);
+TESSEL_PROVIDER_MEMBER(RestoreProperties);
+TESSEL_PROVIDER_MEMBER(RunDiagnostic);
+TESSEL_PROVIDER_MEMBER(RunDiagnosticService);
+TESSEL_PROVIDER_MEMBER(RunTest);
+TESSEL_PROVIDER_MEMBER(SaveProperties);
+TESSEL_PROVIDER_MEMBER(SetAlarmIndicator);
+TESSEL_PROVIDER_MEMBER(SetAlarmState);
+TESSEL_PROVIDER_MEMBER(SetPowerState);
+TESSEL_PROVIDER_MEMBER(SetUrgency);
+TESSEL_PROVIDER_MEMBER(StartService);
+TESSEL_PROVIDER_MEMBER(StopService);
+TESSEL_PROVIDER_MEMBER(executeMethod);
 
 static sint32 _VESPERA_ComputerSystem_Provider_invoke(
     VESPERA_ComputerSystem_Provider* provider, const VESPERA_ComputerSystem* self, Instance* method)
@@ -98,7 +212,9 @@ static sint32 _VESPERA_ComputerSystem_Provider_invoke(
         if (!__is_record<VESPERA_ComputerSystem_RequestStateChange_method>(method))
             return -1;
         VESPERA_ComputerSystem_RequestStateChange_method* m = (VESPERA_ComputerSystem_RequestStateChange_method*)method;
-        return provider->RequestStateChange(self, m->RequestedState, m->Job, m->TimeoutPeriod, m->return_value);
+        return __call_member<__member_RequestStateChange<VESPERA_ComputerSystem_Provider,
+            Invoke_Method_Status(const VESPERA_ComputerSystem*, const Property<uint16>&, CIM_ConcreteJob*&, const Property<Datetime>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->RequestedState, m->Job, m->TimeoutPeriod, m->return_value);
     }
 
     if (strcasecmp(name, "SetPowerState") == 0)
@@ -107,7 +223,9 @@ static sint32 _VESPERA_ComputerSystem_Provider_invoke(
         if (!__is_record<VESPERA_ComputerSystem_SetPowerState_method>(method))
             return -1;
         VESPERA_ComputerSystem_SetPowerState_method* m = (VESPERA_ComputerSystem_SetPowerState_method*)method;
-        return provider->SetPowerState(self, m->PowerState, m->Time, m->return_value);
+        return __call_member<__member_SetPowerState<VESPERA_ComputerSystem_Provider,
+            Invoke_Method_Status(const VESPERA_ComputerSystem*, const Property<uint32>&, const Property<Datetime>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->PowerState, m->Time, m->return_value);
     }
 
     return -1;
@@ -149,7 +267,9 @@ static sint32 _VESPERA_PortController_Provider_invoke(
         if (!__is_record<VESPERA_PortController_RequestStateChange_method>(method))
             return -1;
         VESPERA_PortController_RequestStateChange_method* m = (VESPERA_PortController_RequestStateChange_method*)method;
-        return provider->RequestStateChange(self, m->RequestedState, m->Job, m->TimeoutPeriod, m->return_value);
+        return __call_member<__member_RequestStateChange<VESPERA_PortController_Provider,
+            Invoke_Method_Status(const VESPERA_PortController*, const Property<uint16>&, CIM_ConcreteJob*&, const Property<Datetime>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->RequestedState, m->Job, m->TimeoutPeriod, m->return_value);
     }
 
     if (strcasecmp(name, "SetPowerState") == 0)
@@ -158,7 +278,9 @@ static sint32 _VESPERA_PortController_Provider_invoke(
         if (!__is_record<VESPERA_PortController_SetPowerState_method>(method))
             return -1;
         VESPERA_PortController_SetPowerState_method* m = (VESPERA_PortController_SetPowerState_method*)method;
-        return provider->SetPowerState(self, m->PowerState, m->Time, m->return_value);
+        return __call_member<__member_SetPowerState<VESPERA_PortController_Provider,
+            Invoke_Method_Status(const VESPERA_PortController*, const Property<uint16>&, const Property<Datetime>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->PowerState, m->Time, m->return_value);
     }
 
     if (strcasecmp(name, "Reset") == 0)
@@ -167,7 +289,9 @@ static sint32 _VESPERA_PortController_Provider_invoke(
         if (!__is_record<VESPERA_PortController_Reset_method>(method))
             return -1;
         VESPERA_PortController_Reset_method* m = (VESPERA_PortController_Reset_method*)method;
-        return provider->Reset(self, m->return_value);
+        return __call_member<__member_Reset<VESPERA_PortController_Provider,
+            Invoke_Method_Status(const VESPERA_PortController*, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->return_value);
     }
 
     if (strcasecmp(name, "EnableDevice") == 0)
@@ -176,7 +300,9 @@ static sint32 _VESPERA_PortController_Provider_invoke(
         if (!__is_record<VESPERA_PortController_EnableDevice_method>(method))
             return -1;
         VESPERA_PortController_EnableDevice_method* m = (VESPERA_PortController_EnableDevice_method*)method;
-        return provider->EnableDevice(self, m->Enabled, m->return_value);
+        return __call_member<__member_EnableDevice<VESPERA_PortController_Provider,
+            Invoke_Method_Status(const VESPERA_PortController*, const Property<bool>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->Enabled, m->return_value);
     }
 
     if (strcasecmp(name, "OnlineDevice") == 0)
@@ -185,7 +311,9 @@ static sint32 _VESPERA_PortController_Provider_invoke(
         if (!__is_record<VESPERA_PortController_OnlineDevice_method>(method))
             return -1;
         VESPERA_PortController_OnlineDevice_method* m = (VESPERA_PortController_OnlineDevice_method*)method;
-        return provider->OnlineDevice(self, m->Online, m->return_value);
+        return __call_member<__member_OnlineDevice<VESPERA_PortController_Provider,
+            Invoke_Method_Status(const VESPERA_PortController*, const Property<bool>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->Online, m->return_value);
     }
 
     if (strcasecmp(name, "QuiesceDevice") == 0)
@@ -194,7 +322,9 @@ static sint32 _VESPERA_PortController_Provider_invoke(
         if (!__is_record<VESPERA_PortController_QuiesceDevice_method>(method))
             return -1;
         VESPERA_PortController_QuiesceDevice_method* m = (VESPERA_PortController_QuiesceDevice_method*)method;
-        return provider->QuiesceDevice(self, m->Quiesce, m->return_value);
+        return __call_member<__member_QuiesceDevice<VESPERA_PortController_Provider,
+            Invoke_Method_Status(const VESPERA_PortController*, const Property<bool>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->Quiesce, m->return_value);
     }
 
     if (strcasecmp(name, "SaveProperties") == 0)
@@ -203,7 +333,9 @@ static sint32 _VESPERA_PortController_Provider_invoke(
         if (!__is_record<VESPERA_PortController_SaveProperties_method>(method))
             return -1;
         VESPERA_PortController_SaveProperties_method* m = (VESPERA_PortController_SaveProperties_method*)method;
-        return provider->SaveProperties(self, m->return_value);
+        return __call_member<__member_SaveProperties<VESPERA_PortController_Provider,
+            Invoke_Method_Status(const VESPERA_PortController*, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->return_value);
     }
 
     if (strcasecmp(name, "RestoreProperties") == 0)
@@ -212,7 +344,9 @@ static sint32 _VESPERA_PortController_Provider_invoke(
         if (!__is_record<VESPERA_PortController_RestoreProperties_method>(method))
             return -1;
         VESPERA_PortController_RestoreProperties_method* m = (VESPERA_PortController_RestoreProperties_method*)method;
-        return provider->RestoreProperties(self, m->return_value);
+        return __call_member<__member_RestoreProperties<VESPERA_PortController_Provider,
+            Invoke_Method_Status(const VESPERA_PortController*, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->return_value);
     }
 
     return -1;
@@ -254,7 +388,9 @@ static sint32 _VESPERA_FCPort_Provider_invoke(
         if (!__is_record<VESPERA_FCPort_RequestStateChange_method>(method))
             return -1;
         VESPERA_FCPort_RequestStateChange_method* m = (VESPERA_FCPort_RequestStateChange_method*)method;
-        return provider->RequestStateChange(self, m->RequestedState, m->Job, m->TimeoutPeriod, m->return_value);
+        return __call_member<__member_RequestStateChange<VESPERA_FCPort_Provider,
+            Invoke_Method_Status(const VESPERA_FCPort*, const Property<uint16>&, CIM_ConcreteJob*&, const Property<Datetime>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->RequestedState, m->Job, m->TimeoutPeriod, m->return_value);
     }
 
     if (strcasecmp(name, "SetPowerState") == 0)
@@ -263,7 +399,9 @@ static sint32 _VESPERA_FCPort_Provider_invoke(
         if (!__is_record<VESPERA_FCPort_SetPowerState_method>(method))
             return -1;
         VESPERA_FCPort_SetPowerState_method* m = (VESPERA_FCPort_SetPowerState_method*)method;
-        return provider->SetPowerState(self, m->PowerState, m->Time, m->return_value);
+        return __call_member<__member_SetPowerState<VESPERA_FCPort_Provider,
+            Invoke_Method_Status(const VESPERA_FCPort*, const Property<uint16>&, const Property<Datetime>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->PowerState, m->Time, m->return_value);
     }
 
     if (strcasecmp(name, "Reset") == 0)
@@ -272,7 +410,9 @@ static sint32 _VESPERA_FCPort_Provider_invoke(
         if (!__is_record<VESPERA_FCPort_Reset_method>(method))
             return -1;
         VESPERA_FCPort_Reset_method* m = (VESPERA_FCPort_Reset_method*)method;
-        return provider->Reset(self, m->return_value);
+        return __call_member<__member_Reset<VESPERA_FCPort_Provider,
+            Invoke_Method_Status(const VESPERA_FCPort*, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->return_value);
     }
 
     if (strcasecmp(name, "EnableDevice") == 0)
@@ -281,7 +421,9 @@ static sint32 _VESPERA_FCPort_Provider_invoke(
         if (!__is_record<VESPERA_FCPort_EnableDevice_method>(method))
             return -1;
         VESPERA_FCPort_EnableDevice_method* m = (VESPERA_FCPort_EnableDevice_method*)method;
-        return provider->EnableDevice(self, m->Enabled, m->return_value);
+        return __call_member<__member_EnableDevice<VESPERA_FCPort_Provider,
+            Invoke_Method_Status(const VESPERA_FCPort*, const Property<bool>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->Enabled, m->return_value);
     }
 
     if (strcasecmp(name, "OnlineDevice") == 0)
@@ -290,7 +432,9 @@ static sint32 _VESPERA_FCPort_Provider_invoke(
         if (!__is_record<VESPERA_FCPort_OnlineDevice_method>(method))
             return -1;
         VESPERA_FCPort_OnlineDevice_method* m = (VESPERA_FCPort_OnlineDevice_method*)method;
-        return provider->OnlineDevice(self, m->Online, m->return_value);
+        return __call_member<__member_OnlineDevice<VESPERA_FCPort_Provider,
+            Invoke_Method_Status(const VESPERA_FCPort*, const Property<bool>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->Online, m->return_value);
     }
 
     if (strcasecmp(name, "QuiesceDevice") == 0)
@@ -299,7 +443,9 @@ static sint32 _VESPERA_FCPort_Provider_invoke(
         if (!__is_record<VESPERA_FCPort_QuiesceDevice_method>(method))
             return -1;
         VESPERA_FCPort_QuiesceDevice_method* m = (VESPERA_FCPort_QuiesceDevice_method*)method;
-        return provider->QuiesceDevice(self, m->Quiesce, m->return_value);
+        return __call_member<__member_QuiesceDevice<VESPERA_FCPort_Provider,
+            Invoke_Method_Status(const VESPERA_FCPort*, const Property<bool>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->Quiesce, m->return_value);
     }
 
     if (strcasecmp(name, "SaveProperties") == 0)
@@ -308,7 +454,9 @@ static sint32 _VESPERA_FCPort_Provider_invoke(
         if (!__is_record<VESPERA_FCPort_SaveProperties_method>(method))
             return -1;
         VESPERA_FCPort_SaveProperties_method* m = (VESPERA_FCPort_SaveProperties_method*)method;
-        return provider->SaveProperties(self, m->return_value);
+        return __call_member<__member_SaveProperties<VESPERA_FCPort_Provider,
+            Invoke_Method_Status(const VESPERA_FCPort*, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->return_value);
     }
 
     if (strcasecmp(name, "RestoreProperties") == 0)
@@ -317,7 +465,9 @@ static sint32 _VESPERA_FCPort_Provider_invoke(
         if (!__is_record<VESPERA_FCPort_RestoreProperties_method>(method))
             return -1;
         VESPERA_FCPort_RestoreProperties_method* m = (VESPERA_FCPort_RestoreProperties_method*)method;
-        return provider->RestoreProperties(self, m->return_value);
+        return __call_member<__member_RestoreProperties<VESPERA_FCPort_Provider,
+            Invoke_Method_Status(const VESPERA_FCPort*, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->return_value);
     }
 
     return -1;
@@ -359,7 +509,9 @@ static sint32 _VESPERA_FCPortStatistics_Provider_invoke(
         if (!__is_record<VESPERA_FCPortStatistics_ResetSelectedStats_method>(method))
             return -1;
         VESPERA_FCPortStatistics_ResetSelectedStats_method* m = (VESPERA_FCPortStatistics_ResetSelectedStats_method*)method;
-        return provider->ResetSelectedStats(self, m->SelectedStatistics, m->return_value);
+        return __call_member<__member_ResetSelectedStats<VESPERA_FCPortStatistics_Provider,
+            Invoke_Method_Status(const VESPERA_FCPortStatistics*, const Property<Array<String> >&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->SelectedStatistics, m->return_value);
     }
 
     return -1;
@@ -421,7 +573,9 @@ static sint32 _VESPERA_PhysicalPackage_Provider_invoke(
         if (!__is_record<VESPERA_PhysicalPackage_IsCompatible_method>(method))
             return -1;
         VESPERA_PhysicalPackage_IsCompatible_method* m = (VESPERA_PhysicalPackage_IsCompatible_method*)method;
-        return provider->IsCompatible(self, m->ElementToCheck, m->return_value);
+        return __call_member<__member_IsCompatible<VESPERA_PhysicalPackage_Provider,
+            Invoke_Method_Status(const VESPERA_PhysicalPackage*, const CIM_PhysicalElement*, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->ElementToCheck, m->return_value);
     }
 
     return -1;
@@ -483,7 +637,9 @@ static sint32 _VESPERA_SCSIProtocolEndpoint_Provider_invoke(
         if (!__is_record<VESPERA_SCSIProtocolEndpoint_RequestStateChange_method>(method))
             return -1;
         VESPERA_SCSIProtocolEndpoint_RequestStateChange_method* m = (VESPERA_SCSIProtocolEndpoint_RequestStateChange_method*)method;
-        return provider->RequestStateChange(self, m->RequestedState, m->Job, m->TimeoutPeriod, m->return_value);
+        return __call_member<__member_RequestStateChange<VESPERA_SCSIProtocolEndpoint_Provider,
+            Invoke_Method_Status(const VESPERA_SCSIProtocolEndpoint*, const Property<uint16>&, CIM_ConcreteJob*&, const Property<Datetime>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->RequestedState, m->Job, m->TimeoutPeriod, m->return_value);
     }
 
     if (strcasecmp(name, "BroadcastReset") == 0)
@@ -492,7 +648,9 @@ static sint32 _VESPERA_SCSIProtocolEndpoint_Provider_invoke(
         if (!__is_record<VESPERA_SCSIProtocolEndpoint_BroadcastReset_method>(method))
             return -1;
         VESPERA_SCSIProtocolEndpoint_BroadcastReset_method* m = (VESPERA_SCSIProtocolEndpoint_BroadcastReset_method*)method;
-        return provider->BroadcastReset(self, m->return_value);
+        return __call_member<__member_BroadcastReset<VESPERA_SCSIProtocolEndpoint_Provider,
+            Invoke_Method_Status(const VESPERA_SCSIProtocolEndpoint*, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->return_value);
     }
 
     return -1;
@@ -734,7 +892,9 @@ static sint32 _VESPERA_ObjectManager_Provider_invoke(
         if (!__is_record<VESPERA_ObjectManager_RequestStateChange_method>(method))
             return -1;
         VESPERA_ObjectManager_RequestStateChange_method* m = (VESPERA_ObjectManager_RequestStateChange_method*)method;
-        return provider->RequestStateChange(self, m->RequestedState, m->Job, m->TimeoutPeriod, m->return_value);
+        return __call_member<__member_RequestStateChange<VESPERA_ObjectManager_Provider,
+            Invoke_Method_Status(const VESPERA_ObjectManager*, const Property<uint16>&, CIM_ConcreteJob*&, const Property<Datetime>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->RequestedState, m->Job, m->TimeoutPeriod, m->return_value);
     }
 
     if (strcasecmp(name, "StartService") == 0)
@@ -743,7 +903,9 @@ static sint32 _VESPERA_ObjectManager_Provider_invoke(
         if (!__is_record<VESPERA_ObjectManager_StartService_method>(method))
             return -1;
         VESPERA_ObjectManager_StartService_method* m = (VESPERA_ObjectManager_StartService_method*)method;
-        return provider->StartService(self, m->return_value);
+        return __call_member<__member_StartService<VESPERA_ObjectManager_Provider,
+            Invoke_Method_Status(const VESPERA_ObjectManager*, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->return_value);
     }
 
     if (strcasecmp(name, "StopService") == 0)
@@ -752,7 +914,9 @@ static sint32 _VESPERA_ObjectManager_Provider_invoke(
         if (!__is_record<VESPERA_ObjectManager_StopService_method>(method))
             return -1;
         VESPERA_ObjectManager_StopService_method* m = (VESPERA_ObjectManager_StopService_method*)method;
-        return provider->StopService(self, m->return_value);
+        return __call_member<__member_StopService<VESPERA_ObjectManager_Provider,
+            Invoke_Method_Status(const VESPERA_ObjectManager*, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->return_value);
     }
 
     if (strcasecmp(name, "ChangeAffectedElementsAssignedSequence") == 0)
@@ -761,7 +925,9 @@ static sint32 _VESPERA_ObjectManager_Provider_invoke(
         if (!__is_record<VESPERA_ObjectManager_ChangeAffectedElementsAssignedSequence_method>(method))
             return -1;
         VESPERA_ObjectManager_ChangeAffectedElementsAssignedSequence_method* m = (VESPERA_ObjectManager_ChangeAffectedElementsAssignedSequence_method*)method;
-        return provider->ChangeAffectedElementsAssignedSequence(self, m->ManagedElements, m->AssignedSequence, m->Job, m->return_value);
+        return __call_member<__member_ChangeAffectedElementsAssignedSequence<VESPERA_ObjectManager_Provider,
+            Invoke_Method_Status(const VESPERA_ObjectManager*, const Property<Array<CIM_ManagedElement*> >&, const Property<Array<uint16> >&, CIM_ConcreteJob*&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->ManagedElements, m->AssignedSequence, m->Job, m->return_value);
     }
 
     return -1;
@@ -823,7 +989,9 @@ static sint32 _VESPERA_CIMXMLCommunicationMechanism_Provider_invoke(
         if (!__is_record<VESPERA_CIMXMLCommunicationMechanism_RequestStateChange_method>(method))
             return -1;
         VESPERA_CIMXMLCommunicationMechanism_RequestStateChange_method* m = (VESPERA_CIMXMLCommunicationMechanism_RequestStateChange_method*)method;
-        return provider->RequestStateChange(self, m->RequestedState, m->Job, m->TimeoutPeriod, m->return_value);
+        return __call_member<__member_RequestStateChange<VESPERA_CIMXMLCommunicationMechanism_Provider,
+            Invoke_Method_Status(const VESPERA_CIMXMLCommunicationMechanism*, const Property<uint16>&, CIM_ConcreteJob*&, const Property<Datetime>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->RequestedState, m->Job, m->TimeoutPeriod, m->return_value);
     }
 
     return -1;
@@ -945,7 +1113,9 @@ static sint32 _VESPERA_RegisteredProfile_Provider_invoke(
         if (!__is_record<VESPERA_RegisteredProfile_CloseConformantInstances_method>(method))
             return -1;
         VESPERA_RegisteredProfile_CloseConformantInstances_method* m = (VESPERA_RegisteredProfile_CloseConformantInstances_method*)method;
-        return provider->CloseConformantInstances(self, m->EnumerationContext, m->return_value);
+        return __call_member<__member_CloseConformantInstances<VESPERA_RegisteredProfile_Provider,
+            Invoke_Method_Status(const VESPERA_RegisteredProfile*, const Property<String>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->EnumerationContext, m->return_value);
     }
 
     if (strcasecmp(name, "OpenConformantInstances") == 0)
@@ -954,7 +1124,9 @@ static sint32 _VESPERA_RegisteredProfile_Provider_invoke(
         if (!__is_record<VESPERA_RegisteredProfile_OpenConformantInstances_method>(method))
             return -1;
         VESPERA_RegisteredProfile_OpenConformantInstances_method* m = (VESPERA_RegisteredProfile_OpenConformantInstances_method*)method;
-        return provider->OpenConformantInstances(self, m->ResultClass, m->IncludedPropertyList, m->OperationTimeout, m->ContinueOnError, m->MaxObjectCount, m->EnumerationContext, m->EndOfSequence, m->InstanceType, m->InstanceWithPathList, m->return_value);
+        return __call_member<__member_OpenConformantInstances<VESPERA_RegisteredProfile_Provider,
+            Invoke_Method_Status(const VESPERA_RegisteredProfile*, const Property<String>&, const Property<Array<String> >&, const Property<uint32>&, const Property<bool>&, const Property<uint32>&, Property<String>&, Property<bool>&, Property<Array<uint16> >&, Property<Array<String> >&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->ResultClass, m->IncludedPropertyList, m->OperationTimeout, m->ContinueOnError, m->MaxObjectCount, m->EnumerationContext, m->EndOfSequence, m->InstanceType, m->InstanceWithPathList, m->return_value);
     }
 
     if (strcasecmp(name, "PullConformantInstances") == 0)
@@ -963,7 +1135,9 @@ static sint32 _VESPERA_RegisteredProfile_Provider_invoke(
         if (!__is_record<VESPERA_RegisteredProfile_PullConformantInstances_method>(method))
             return -1;
         VESPERA_RegisteredProfile_PullConformantInstances_method* m = (VESPERA_RegisteredProfile_PullConformantInstances_method*)method;
-        return provider->PullConformantInstances(self, m->EnumerationContext, m->MaxObjectCount, m->EndOfSequence, m->InstanceType, m->InstanceWithPathList, m->return_value);
+        return __call_member<__member_PullConformantInstances<VESPERA_RegisteredProfile_Provider,
+            Invoke_Method_Status(const VESPERA_RegisteredProfile*, Property<String>&, const Property<uint32>&, Property<bool>&, Property<Array<uint16> >&, Property<Array<String> >&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->EnumerationContext, m->MaxObjectCount, m->EndOfSequence, m->InstanceType, m->InstanceWithPathList, m->return_value);
     }
 
     return -1;
@@ -1005,7 +1179,9 @@ static sint32 _VESPERA_RegisteredSubProfile_Provider_invoke(
         if (!__is_record<VESPERA_RegisteredSubProfile_CloseConformantInstances_method>(method))
             return -1;
         VESPERA_RegisteredSubProfile_CloseConformantInstances_method* m = (VESPERA_RegisteredSubProfile_CloseConformantInstances_method*)method;
-        return provider->CloseConformantInstances(self, m->EnumerationContext, m->return_value);
+        return __call_member<__member_CloseConformantInstances<VESPERA_RegisteredSubProfile_Provider,
+            Invoke_Method_Status(const VESPERA_RegisteredSubProfile*, const Property<String>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->EnumerationContext, m->return_value);
     }
 
     if (strcasecmp(name, "OpenConformantInstances") == 0)
@@ -1014,7 +1190,9 @@ static sint32 _VESPERA_RegisteredSubProfile_Provider_invoke(
         if (!__is_record<VESPERA_RegisteredSubProfile_OpenConformantInstances_method>(method))
             return -1;
         VESPERA_RegisteredSubProfile_OpenConformantInstances_method* m = (VESPERA_RegisteredSubProfile_OpenConformantInstances_method*)method;
-        return provider->OpenConformantInstances(self, m->ResultClass, m->IncludedPropertyList, m->OperationTimeout, m->ContinueOnError, m->MaxObjectCount, m->EnumerationContext, m->EndOfSequence, m->InstanceType, m->InstanceWithPathList, m->return_value);
+        return __call_member<__member_OpenConformantInstances<VESPERA_RegisteredSubProfile_Provider,
+            Invoke_Method_Status(const VESPERA_RegisteredSubProfile*, const Property<String>&, const Property<Array<String> >&, const Property<uint32>&, const Property<bool>&, const Property<uint32>&, Property<String>&, Property<bool>&, Property<Array<uint16> >&, Property<Array<String> >&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->ResultClass, m->IncludedPropertyList, m->OperationTimeout, m->ContinueOnError, m->MaxObjectCount, m->EnumerationContext, m->EndOfSequence, m->InstanceType, m->InstanceWithPathList, m->return_value);
     }
 
     if (strcasecmp(name, "PullConformantInstances") == 0)
@@ -1023,7 +1201,9 @@ static sint32 _VESPERA_RegisteredSubProfile_Provider_invoke(
         if (!__is_record<VESPERA_RegisteredSubProfile_PullConformantInstances_method>(method))
             return -1;
         VESPERA_RegisteredSubProfile_PullConformantInstances_method* m = (VESPERA_RegisteredSubProfile_PullConformantInstances_method*)method;
-        return provider->PullConformantInstances(self, m->EnumerationContext, m->MaxObjectCount, m->EndOfSequence, m->InstanceType, m->InstanceWithPathList, m->return_value);
+        return __call_member<__member_PullConformantInstances<VESPERA_RegisteredSubProfile_Provider,
+            Invoke_Method_Status(const VESPERA_RegisteredSubProfile*, Property<String>&, const Property<uint32>&, Property<bool>&, Property<Array<uint16> >&, Property<Array<String> >&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->EnumerationContext, m->MaxObjectCount, m->EndOfSequence, m->InstanceType, m->InstanceWithPathList, m->return_value);
     }
 
     return -1;
@@ -1145,7 +1325,9 @@ static sint32 _VESPERA_LogicalDisk_Provider_invoke(
         if (!__is_record<VESPERA_LogicalDisk_RequestStateChange_method>(method))
             return -1;
         VESPERA_LogicalDisk_RequestStateChange_method* m = (VESPERA_LogicalDisk_RequestStateChange_method*)method;
-        return provider->RequestStateChange(self, m->RequestedState, m->Job, m->TimeoutPeriod, m->return_value);
+        return __call_member<__member_RequestStateChange<VESPERA_LogicalDisk_Provider,
+            Invoke_Method_Status(const VESPERA_LogicalDisk*, const Property<uint16>&, CIM_ConcreteJob*&, const Property<Datetime>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->RequestedState, m->Job, m->TimeoutPeriod, m->return_value);
     }
 
     if (strcasecmp(name, "SetPowerState") == 0)
@@ -1154,7 +1336,9 @@ static sint32 _VESPERA_LogicalDisk_Provider_invoke(
         if (!__is_record<VESPERA_LogicalDisk_SetPowerState_method>(method))
             return -1;
         VESPERA_LogicalDisk_SetPowerState_method* m = (VESPERA_LogicalDisk_SetPowerState_method*)method;
-        return provider->SetPowerState(self, m->PowerState, m->Time, m->return_value);
+        return __call_member<__member_SetPowerState<VESPERA_LogicalDisk_Provider,
+            Invoke_Method_Status(const VESPERA_LogicalDisk*, const Property<uint16>&, const Property<Datetime>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->PowerState, m->Time, m->return_value);
     }
 
     if (strcasecmp(name, "Reset") == 0)
@@ -1163,7 +1347,9 @@ static sint32 _VESPERA_LogicalDisk_Provider_invoke(
         if (!__is_record<VESPERA_LogicalDisk_Reset_method>(method))
             return -1;
         VESPERA_LogicalDisk_Reset_method* m = (VESPERA_LogicalDisk_Reset_method*)method;
-        return provider->Reset(self, m->return_value);
+        return __call_member<__member_Reset<VESPERA_LogicalDisk_Provider,
+            Invoke_Method_Status(const VESPERA_LogicalDisk*, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->return_value);
     }
 
     if (strcasecmp(name, "EnableDevice") == 0)
@@ -1172,7 +1358,9 @@ static sint32 _VESPERA_LogicalDisk_Provider_invoke(
         if (!__is_record<VESPERA_LogicalDisk_EnableDevice_method>(method))
             return -1;
         VESPERA_LogicalDisk_EnableDevice_method* m = (VESPERA_LogicalDisk_EnableDevice_method*)method;
-        return provider->EnableDevice(self, m->Enabled, m->return_value);
+        return __call_member<__member_EnableDevice<VESPERA_LogicalDisk_Provider,
+            Invoke_Method_Status(const VESPERA_LogicalDisk*, const Property<bool>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->Enabled, m->return_value);
     }
 
     if (strcasecmp(name, "OnlineDevice") == 0)
@@ -1181,7 +1369,9 @@ static sint32 _VESPERA_LogicalDisk_Provider_invoke(
         if (!__is_record<VESPERA_LogicalDisk_OnlineDevice_method>(method))
             return -1;
         VESPERA_LogicalDisk_OnlineDevice_method* m = (VESPERA_LogicalDisk_OnlineDevice_method*)method;
-        return provider->OnlineDevice(self, m->Online, m->return_value);
+        return __call_member<__member_OnlineDevice<VESPERA_LogicalDisk_Provider,
+            Invoke_Method_Status(const VESPERA_LogicalDisk*, const Property<bool>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->Online, m->return_value);
     }
 
     if (strcasecmp(name, "QuiesceDevice") == 0)
@@ -1190,7 +1380,9 @@ static sint32 _VESPERA_LogicalDisk_Provider_invoke(
         if (!__is_record<VESPERA_LogicalDisk_QuiesceDevice_method>(method))
             return -1;
         VESPERA_LogicalDisk_QuiesceDevice_method* m = (VESPERA_LogicalDisk_QuiesceDevice_method*)method;
-        return provider->QuiesceDevice(self, m->Quiesce, m->return_value);
+        return __call_member<__member_QuiesceDevice<VESPERA_LogicalDisk_Provider,
+            Invoke_Method_Status(const VESPERA_LogicalDisk*, const Property<bool>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->Quiesce, m->return_value);
     }
 
     if (strcasecmp(name, "SaveProperties") == 0)
@@ -1199,7 +1391,9 @@ static sint32 _VESPERA_LogicalDisk_Provider_invoke(
         if (!__is_record<VESPERA_LogicalDisk_SaveProperties_method>(method))
             return -1;
         VESPERA_LogicalDisk_SaveProperties_method* m = (VESPERA_LogicalDisk_SaveProperties_method*)method;
-        return provider->SaveProperties(self, m->return_value);
+        return __call_member<__member_SaveProperties<VESPERA_LogicalDisk_Provider,
+            Invoke_Method_Status(const VESPERA_LogicalDisk*, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->return_value);
     }
 
     if (strcasecmp(name, "RestoreProperties") == 0)
@@ -1208,7 +1402,9 @@ static sint32 _VESPERA_LogicalDisk_Provider_invoke(
         if (!__is_record<VESPERA_LogicalDisk_RestoreProperties_method>(method))
             return -1;
         VESPERA_LogicalDisk_RestoreProperties_method* m = (VESPERA_LogicalDisk_RestoreProperties_method*)method;
-        return provider->RestoreProperties(self, m->return_value);
+        return __call_member<__member_RestoreProperties<VESPERA_LogicalDisk_Provider,
+            Invoke_Method_Status(const VESPERA_LogicalDisk*, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->return_value);
     }
 
     return -1;
@@ -1250,7 +1446,9 @@ static sint32 _VESPERA_StorageExtent_Provider_invoke(
         if (!__is_record<VESPERA_StorageExtent_RequestStateChange_method>(method))
             return -1;
         VESPERA_StorageExtent_RequestStateChange_method* m = (VESPERA_StorageExtent_RequestStateChange_method*)method;
-        return provider->RequestStateChange(self, m->RequestedState, m->Job, m->TimeoutPeriod, m->return_value);
+        return __call_member<__member_RequestStateChange<VESPERA_StorageExtent_Provider,
+            Invoke_Method_Status(const VESPERA_StorageExtent*, const Property<uint16>&, CIM_ConcreteJob*&, const Property<Datetime>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->RequestedState, m->Job, m->TimeoutPeriod, m->return_value);
     }
 
     if (strcasecmp(name, "SetPowerState") == 0)
@@ -1259,7 +1457,9 @@ static sint32 _VESPERA_StorageExtent_Provider_invoke(
         if (!__is_record<VESPERA_StorageExtent_SetPowerState_method>(method))
             return -1;
         VESPERA_StorageExtent_SetPowerState_method* m = (VESPERA_StorageExtent_SetPowerState_method*)method;
-        return provider->SetPowerState(self, m->PowerState, m->Time, m->return_value);
+        return __call_member<__member_SetPowerState<VESPERA_StorageExtent_Provider,
+            Invoke_Method_Status(const VESPERA_StorageExtent*, const Property<uint16>&, const Property<Datetime>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->PowerState, m->Time, m->return_value);
     }
 
     if (strcasecmp(name, "Reset") == 0)
@@ -1268,7 +1468,9 @@ static sint32 _VESPERA_StorageExtent_Provider_invoke(
         if (!__is_record<VESPERA_StorageExtent_Reset_method>(method))
             return -1;
         VESPERA_StorageExtent_Reset_method* m = (VESPERA_StorageExtent_Reset_method*)method;
-        return provider->Reset(self, m->return_value);
+        return __call_member<__member_Reset<VESPERA_StorageExtent_Provider,
+            Invoke_Method_Status(const VESPERA_StorageExtent*, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->return_value);
     }
 
     if (strcasecmp(name, "EnableDevice") == 0)
@@ -1277,7 +1479,9 @@ static sint32 _VESPERA_StorageExtent_Provider_invoke(
         if (!__is_record<VESPERA_StorageExtent_EnableDevice_method>(method))
             return -1;
         VESPERA_StorageExtent_EnableDevice_method* m = (VESPERA_StorageExtent_EnableDevice_method*)method;
-        return provider->EnableDevice(self, m->Enabled, m->return_value);
+        return __call_member<__member_EnableDevice<VESPERA_StorageExtent_Provider,
+            Invoke_Method_Status(const VESPERA_StorageExtent*, const Property<bool>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->Enabled, m->return_value);
     }
 
     if (strcasecmp(name, "OnlineDevice") == 0)
@@ -1286,7 +1490,9 @@ static sint32 _VESPERA_StorageExtent_Provider_invoke(
         if (!__is_record<VESPERA_StorageExtent_OnlineDevice_method>(method))
             return -1;
         VESPERA_StorageExtent_OnlineDevice_method* m = (VESPERA_StorageExtent_OnlineDevice_method*)method;
-        return provider->OnlineDevice(self, m->Online, m->return_value);
+        return __call_member<__member_OnlineDevice<VESPERA_StorageExtent_Provider,
+            Invoke_Method_Status(const VESPERA_StorageExtent*, const Property<bool>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->Online, m->return_value);
     }
 
     if (strcasecmp(name, "QuiesceDevice") == 0)
@@ -1295,7 +1501,9 @@ static sint32 _VESPERA_StorageExtent_Provider_invoke(
         if (!__is_record<VESPERA_StorageExtent_QuiesceDevice_method>(method))
             return -1;
         VESPERA_StorageExtent_QuiesceDevice_method* m = (VESPERA_StorageExtent_QuiesceDevice_method*)method;
-        return provider->QuiesceDevice(self, m->Quiesce, m->return_value);
+        return __call_member<__member_QuiesceDevice<VESPERA_StorageExtent_Provider,
+            Invoke_Method_Status(const VESPERA_StorageExtent*, const Property<bool>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->Quiesce, m->return_value);
     }
 
     if (strcasecmp(name, "SaveProperties") == 0)
@@ -1304,7 +1512,9 @@ static sint32 _VESPERA_StorageExtent_Provider_invoke(
         if (!__is_record<VESPERA_StorageExtent_SaveProperties_method>(method))
             return -1;
         VESPERA_StorageExtent_SaveProperties_method* m = (VESPERA_StorageExtent_SaveProperties_method*)method;
-        return provider->SaveProperties(self, m->return_value);
+        return __call_member<__member_SaveProperties<VESPERA_StorageExtent_Provider,
+            Invoke_Method_Status(const VESPERA_StorageExtent*, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->return_value);
     }
 
     if (strcasecmp(name, "RestoreProperties") == 0)
@@ -1313,7 +1523,9 @@ static sint32 _VESPERA_StorageExtent_Provider_invoke(
         if (!__is_record<VESPERA_StorageExtent_RestoreProperties_method>(method))
             return -1;
         VESPERA_StorageExtent_RestoreProperties_method* m = (VESPERA_StorageExtent_RestoreProperties_method*)method;
-        return provider->RestoreProperties(self, m->return_value);
+        return __call_member<__member_RestoreProperties<VESPERA_StorageExtent_Provider,
+            Invoke_Method_Status(const VESPERA_StorageExtent*, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->return_value);
     }
 
     return -1;
@@ -1355,7 +1567,9 @@ static sint32 _VESPERA_TapeDrive_Provider_invoke(
         if (!__is_record<VESPERA_TapeDrive_RequestStateChange_method>(method))
             return -1;
         VESPERA_TapeDrive_RequestStateChange_method* m = (VESPERA_TapeDrive_RequestStateChange_method*)method;
-        return provider->RequestStateChange(self, m->RequestedState, m->Job, m->TimeoutPeriod, m->return_value);
+        return __call_member<__member_RequestStateChange<VESPERA_TapeDrive_Provider,
+            Invoke_Method_Status(const VESPERA_TapeDrive*, const Property<uint16>&, CIM_ConcreteJob*&, const Property<Datetime>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->RequestedState, m->Job, m->TimeoutPeriod, m->return_value);
     }
 
     if (strcasecmp(name, "SetPowerState") == 0)
@@ -1364,7 +1578,9 @@ static sint32 _VESPERA_TapeDrive_Provider_invoke(
         if (!__is_record<VESPERA_TapeDrive_SetPowerState_method>(method))
             return -1;
         VESPERA_TapeDrive_SetPowerState_method* m = (VESPERA_TapeDrive_SetPowerState_method*)method;
-        return provider->SetPowerState(self, m->PowerState, m->Time, m->return_value);
+        return __call_member<__member_SetPowerState<VESPERA_TapeDrive_Provider,
+            Invoke_Method_Status(const VESPERA_TapeDrive*, const Property<uint16>&, const Property<Datetime>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->PowerState, m->Time, m->return_value);
     }
 
     if (strcasecmp(name, "Reset") == 0)
@@ -1373,7 +1589,9 @@ static sint32 _VESPERA_TapeDrive_Provider_invoke(
         if (!__is_record<VESPERA_TapeDrive_Reset_method>(method))
             return -1;
         VESPERA_TapeDrive_Reset_method* m = (VESPERA_TapeDrive_Reset_method*)method;
-        return provider->Reset(self, m->return_value);
+        return __call_member<__member_Reset<VESPERA_TapeDrive_Provider,
+            Invoke_Method_Status(const VESPERA_TapeDrive*, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->return_value);
     }
 
     if (strcasecmp(name, "EnableDevice") == 0)
@@ -1382,7 +1600,9 @@ static sint32 _VESPERA_TapeDrive_Provider_invoke(
         if (!__is_record<VESPERA_TapeDrive_EnableDevice_method>(method))
             return -1;
         VESPERA_TapeDrive_EnableDevice_method* m = (VESPERA_TapeDrive_EnableDevice_method*)method;
-        return provider->EnableDevice(self, m->Enabled, m->return_value);
+        return __call_member<__member_EnableDevice<VESPERA_TapeDrive_Provider,
+            Invoke_Method_Status(const VESPERA_TapeDrive*, const Property<bool>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->Enabled, m->return_value);
     }
 
     if (strcasecmp(name, "OnlineDevice") == 0)
@@ -1391,7 +1611,9 @@ static sint32 _VESPERA_TapeDrive_Provider_invoke(
         if (!__is_record<VESPERA_TapeDrive_OnlineDevice_method>(method))
             return -1;
         VESPERA_TapeDrive_OnlineDevice_method* m = (VESPERA_TapeDrive_OnlineDevice_method*)method;
-        return provider->OnlineDevice(self, m->Online, m->return_value);
+        return __call_member<__member_OnlineDevice<VESPERA_TapeDrive_Provider,
+            Invoke_Method_Status(const VESPERA_TapeDrive*, const Property<bool>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->Online, m->return_value);
     }
 
     if (strcasecmp(name, "QuiesceDevice") == 0)
@@ -1400,7 +1622,9 @@ static sint32 _VESPERA_TapeDrive_Provider_invoke(
         if (!__is_record<VESPERA_TapeDrive_QuiesceDevice_method>(method))
             return -1;
         VESPERA_TapeDrive_QuiesceDevice_method* m = (VESPERA_TapeDrive_QuiesceDevice_method*)method;
-        return provider->QuiesceDevice(self, m->Quiesce, m->return_value);
+        return __call_member<__member_QuiesceDevice<VESPERA_TapeDrive_Provider,
+            Invoke_Method_Status(const VESPERA_TapeDrive*, const Property<bool>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->Quiesce, m->return_value);
     }
 
     if (strcasecmp(name, "SaveProperties") == 0)
@@ -1409,7 +1633,9 @@ static sint32 _VESPERA_TapeDrive_Provider_invoke(
         if (!__is_record<VESPERA_TapeDrive_SaveProperties_method>(method))
             return -1;
         VESPERA_TapeDrive_SaveProperties_method* m = (VESPERA_TapeDrive_SaveProperties_method*)method;
-        return provider->SaveProperties(self, m->return_value);
+        return __call_member<__member_SaveProperties<VESPERA_TapeDrive_Provider,
+            Invoke_Method_Status(const VESPERA_TapeDrive*, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->return_value);
     }
 
     if (strcasecmp(name, "RestoreProperties") == 0)
@@ -1418,7 +1644,9 @@ static sint32 _VESPERA_TapeDrive_Provider_invoke(
         if (!__is_record<VESPERA_TapeDrive_RestoreProperties_method>(method))
             return -1;
         VESPERA_TapeDrive_RestoreProperties_method* m = (VESPERA_TapeDrive_RestoreProperties_method*)method;
-        return provider->RestoreProperties(self, m->return_value);
+        return __call_member<__member_RestoreProperties<VESPERA_TapeDrive_Provider,
+            Invoke_Method_Status(const VESPERA_TapeDrive*, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->return_value);
     }
 
     if (strcasecmp(name, "LockMedia") == 0)
@@ -1427,7 +1655,9 @@ static sint32 _VESPERA_TapeDrive_Provider_invoke(
         if (!__is_record<VESPERA_TapeDrive_LockMedia_method>(method))
             return -1;
         VESPERA_TapeDrive_LockMedia_method* m = (VESPERA_TapeDrive_LockMedia_method*)method;
-        return provider->LockMedia(self, m->Lock, m->return_value);
+        return __call_member<__member_LockMedia<VESPERA_TapeDrive_Provider,
+            Invoke_Method_Status(const VESPERA_TapeDrive*, const Property<bool>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->Lock, m->return_value);
     }
 
     return -1;
@@ -1489,7 +1719,9 @@ static sint32 _VESPERA_RemoteServiceAccessPoint_Provider_invoke(
         if (!__is_record<VESPERA_RemoteServiceAccessPoint_RequestStateChange_method>(method))
             return -1;
         VESPERA_RemoteServiceAccessPoint_RequestStateChange_method* m = (VESPERA_RemoteServiceAccessPoint_RequestStateChange_method*)method;
-        return provider->RequestStateChange(self, m->RequestedState, m->Job, m->TimeoutPeriod, m->return_value);
+        return __call_member<__member_RequestStateChange<VESPERA_RemoteServiceAccessPoint_Provider,
+            Invoke_Method_Status(const VESPERA_RemoteServiceAccessPoint*, const Property<uint16>&, CIM_ConcreteJob*&, const Property<Datetime>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->RequestedState, m->Job, m->TimeoutPeriod, m->return_value);
     }
 
     return -1;
@@ -1551,7 +1783,9 @@ static sint32 _VESPERA_HBASoftwareInstallationService_Provider_invoke(
         if (!__is_record<VESPERA_HBASoftwareInstallationService_RequestStateChange_method>(method))
             return -1;
         VESPERA_HBASoftwareInstallationService_RequestStateChange_method* m = (VESPERA_HBASoftwareInstallationService_RequestStateChange_method*)method;
-        return provider->RequestStateChange(self, m->RequestedState, m->Job, m->TimeoutPeriod, m->return_value);
+        return __call_member<__member_RequestStateChange<VESPERA_HBASoftwareInstallationService_Provider,
+            Invoke_Method_Status(const VESPERA_HBASoftwareInstallationService*, const Property<uint16>&, CIM_ConcreteJob*&, const Property<Datetime>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->RequestedState, m->Job, m->TimeoutPeriod, m->return_value);
     }
 
     if (strcasecmp(name, "StartService") == 0)
@@ -1560,7 +1794,9 @@ static sint32 _VESPERA_HBASoftwareInstallationService_Provider_invoke(
         if (!__is_record<VESPERA_HBASoftwareInstallationService_StartService_method>(method))
             return -1;
         VESPERA_HBASoftwareInstallationService_StartService_method* m = (VESPERA_HBASoftwareInstallationService_StartService_method*)method;
-        return provider->StartService(self, m->return_value);
+        return __call_member<__member_StartService<VESPERA_HBASoftwareInstallationService_Provider,
+            Invoke_Method_Status(const VESPERA_HBASoftwareInstallationService*, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->return_value);
     }
 
     if (strcasecmp(name, "StopService") == 0)
@@ -1569,7 +1805,9 @@ static sint32 _VESPERA_HBASoftwareInstallationService_Provider_invoke(
         if (!__is_record<VESPERA_HBASoftwareInstallationService_StopService_method>(method))
             return -1;
         VESPERA_HBASoftwareInstallationService_StopService_method* m = (VESPERA_HBASoftwareInstallationService_StopService_method*)method;
-        return provider->StopService(self, m->return_value);
+        return __call_member<__member_StopService<VESPERA_HBASoftwareInstallationService_Provider,
+            Invoke_Method_Status(const VESPERA_HBASoftwareInstallationService*, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->return_value);
     }
 
     if (strcasecmp(name, "ChangeAffectedElementsAssignedSequence") == 0)
@@ -1578,7 +1816,9 @@ static sint32 _VESPERA_HBASoftwareInstallationService_Provider_invoke(
         if (!__is_record<VESPERA_HBASoftwareInstallationService_ChangeAffectedElementsAssignedSequence_method>(method))
             return -1;
         VESPERA_HBASoftwareInstallationService_ChangeAffectedElementsAssignedSequence_method* m = (VESPERA_HBASoftwareInstallationService_ChangeAffectedElementsAssignedSequence_method*)method;
-        return provider->ChangeAffectedElementsAssignedSequence(self, m->ManagedElements, m->AssignedSequence, m->Job, m->return_value);
+        return __call_member<__member_ChangeAffectedElementsAssignedSequence<VESPERA_HBASoftwareInstallationService_Provider,
+            Invoke_Method_Status(const VESPERA_HBASoftwareInstallationService*, const Property<Array<CIM_ManagedElement*> >&, const Property<Array<uint16> >&, CIM_ConcreteJob*&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->ManagedElements, m->AssignedSequence, m->Job, m->return_value);
     }
 
     if (strcasecmp(name, "CheckSoftwareIdentity") == 0)
@@ -1587,7 +1827,9 @@ static sint32 _VESPERA_HBASoftwareInstallationService_Provider_invoke(
         if (!__is_record<VESPERA_HBASoftwareInstallationService_CheckSoftwareIdentity_method>(method))
             return -1;
         VESPERA_HBASoftwareInstallationService_CheckSoftwareIdentity_method* m = (VESPERA_HBASoftwareInstallationService_CheckSoftwareIdentity_method*)method;
-        return provider->CheckSoftwareIdentity(self, m->Source, m->Target, m->Collection, m->InstallCharacteristics, m->return_value);
+        return __call_member<__member_CheckSoftwareIdentity<VESPERA_HBASoftwareInstallationService_Provider,
+            Invoke_Method_Status(const VESPERA_HBASoftwareInstallationService*, const CIM_SoftwareIdentity*, const CIM_ManagedElement*, const CIM_Collection*, Property<Array<uint16> >&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->Source, m->Target, m->Collection, m->InstallCharacteristics, m->return_value);
     }
 
     if (strcasecmp(name, "InstallFromSoftwareIdentity") == 0)
@@ -1596,7 +1838,9 @@ static sint32 _VESPERA_HBASoftwareInstallationService_Provider_invoke(
         if (!__is_record<VESPERA_HBASoftwareInstallationService_InstallFromSoftwareIdentity_method>(method))
             return -1;
         VESPERA_HBASoftwareInstallationService_InstallFromSoftwareIdentity_method* m = (VESPERA_HBASoftwareInstallationService_InstallFromSoftwareIdentity_method*)method;
-        return provider->InstallFromSoftwareIdentity(self, m->Job, m->InstallOptions, m->InstallOptionsValues, m->Source, m->Target, m->Collection, m->return_value);
+        return __call_member<__member_InstallFromSoftwareIdentity<VESPERA_HBASoftwareInstallationService_Provider,
+            Invoke_Method_Status(const VESPERA_HBASoftwareInstallationService*, CIM_ConcreteJob*&, const Property<Array<uint16> >&, const Property<Array<String> >&, const CIM_SoftwareIdentity*, const CIM_ManagedElement*, const CIM_Collection*, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->Job, m->InstallOptions, m->InstallOptionsValues, m->Source, m->Target, m->Collection, m->return_value);
     }
 
     if (strcasecmp(name, "InstallFromByteStream") == 0)
@@ -1605,7 +1849,9 @@ static sint32 _VESPERA_HBASoftwareInstallationService_Provider_invoke(
         if (!__is_record<VESPERA_HBASoftwareInstallationService_InstallFromByteStream_method>(method))
             return -1;
         VESPERA_HBASoftwareInstallationService_InstallFromByteStream_method* m = (VESPERA_HBASoftwareInstallationService_InstallFromByteStream_method*)method;
-        return provider->InstallFromByteStream(self, m->Job, m->Image, m->Target, m->InstallOptions, m->InstallOptionsValues, m->return_value);
+        return __call_member<__member_InstallFromByteStream<VESPERA_HBASoftwareInstallationService_Provider,
+            Invoke_Method_Status(const VESPERA_HBASoftwareInstallationService*, CIM_ConcreteJob*&, const Property<Array<uint8> >&, const CIM_ManagedElement*, const Property<Array<uint16> >&, const Property<Array<String> >&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->Job, m->Image, m->Target, m->InstallOptions, m->InstallOptionsValues, m->return_value);
     }
 
     if (strcasecmp(name, "InstallFromURI") == 0)
@@ -1614,7 +1860,9 @@ static sint32 _VESPERA_HBASoftwareInstallationService_Provider_invoke(
         if (!__is_record<VESPERA_HBASoftwareInstallationService_InstallFromURI_method>(method))
             return -1;
         VESPERA_HBASoftwareInstallationService_InstallFromURI_method* m = (VESPERA_HBASoftwareInstallationService_InstallFromURI_method*)method;
-        return provider->InstallFromURI(self, m->Job, m->URI, m->Target, m->InstallOptions, m->InstallOptionsValues, m->return_value);
+        return __call_member<__member_InstallFromURI<VESPERA_HBASoftwareInstallationService_Provider,
+            Invoke_Method_Status(const VESPERA_HBASoftwareInstallationService*, CIM_ConcreteJob*&, const Property<String>&, const CIM_ManagedElement*, const Property<Array<uint16> >&, const Property<Array<String> >&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->Job, m->URI, m->Target, m->InstallOptions, m->InstallOptionsValues, m->return_value);
     }
 
     return -1;
@@ -1656,7 +1904,9 @@ static sint32 _VESPERA_HBASoftwareInstallationServiceCapabilities_Provider_invok
         if (!__is_record<VESPERA_HBASoftwareInstallationServiceCapabilities_CreateGoalSettings_method>(method))
             return -1;
         VESPERA_HBASoftwareInstallationServiceCapabilities_CreateGoalSettings_method* m = (VESPERA_HBASoftwareInstallationServiceCapabilities_CreateGoalSettings_method*)method;
-        return provider->CreateGoalSettings(self, m->TemplateGoalSettings, m->SupportedGoalSettings, m->return_value);
+        return __call_member<__member_CreateGoalSettings<VESPERA_HBASoftwareInstallationServiceCapabilities_Provider,
+            Invoke_Method_Status(const VESPERA_HBASoftwareInstallationServiceCapabilities*, const Property<Array<String> >&, Property<Array<String> >&, Property<uint16>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->TemplateGoalSettings, m->SupportedGoalSettings, m->return_value);
     }
 
     return -1;
@@ -1738,7 +1988,9 @@ static sint32 _VESPERA_EthernetPort_Provider_invoke(
         if (!__is_record<VESPERA_EthernetPort_RequestStateChange_method>(method))
             return -1;
         VESPERA_EthernetPort_RequestStateChange_method* m = (VESPERA_EthernetPort_RequestStateChange_method*)method;
-        return provider->RequestStateChange(self, m->RequestedState, m->Job, m->TimeoutPeriod, m->return_value);
+        return __call_member<__member_RequestStateChange<VESPERA_EthernetPort_Provider,
+            Invoke_Method_Status(const VESPERA_EthernetPort*, const Property<uint16>&, CIM_ConcreteJob*&, const Property<Datetime>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->RequestedState, m->Job, m->TimeoutPeriod, m->return_value);
     }
 
     if (strcasecmp(name, "SetPowerState") == 0)
@@ -1747,7 +1999,9 @@ static sint32 _VESPERA_EthernetPort_Provider_invoke(
         if (!__is_record<VESPERA_EthernetPort_SetPowerState_method>(method))
             return -1;
         VESPERA_EthernetPort_SetPowerState_method* m = (VESPERA_EthernetPort_SetPowerState_method*)method;
-        return provider->SetPowerState(self, m->PowerState, m->Time, m->return_value);
+        return __call_member<__member_SetPowerState<VESPERA_EthernetPort_Provider,
+            Invoke_Method_Status(const VESPERA_EthernetPort*, const Property<uint16>&, const Property<Datetime>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->PowerState, m->Time, m->return_value);
     }
 
     if (strcasecmp(name, "Reset") == 0)
@@ -1756,7 +2010,9 @@ static sint32 _VESPERA_EthernetPort_Provider_invoke(
         if (!__is_record<VESPERA_EthernetPort_Reset_method>(method))
             return -1;
         VESPERA_EthernetPort_Reset_method* m = (VESPERA_EthernetPort_Reset_method*)method;
-        return provider->Reset(self, m->return_value);
+        return __call_member<__member_Reset<VESPERA_EthernetPort_Provider,
+            Invoke_Method_Status(const VESPERA_EthernetPort*, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->return_value);
     }
 
     if (strcasecmp(name, "EnableDevice") == 0)
@@ -1765,7 +2021,9 @@ static sint32 _VESPERA_EthernetPort_Provider_invoke(
         if (!__is_record<VESPERA_EthernetPort_EnableDevice_method>(method))
             return -1;
         VESPERA_EthernetPort_EnableDevice_method* m = (VESPERA_EthernetPort_EnableDevice_method*)method;
-        return provider->EnableDevice(self, m->Enabled, m->return_value);
+        return __call_member<__member_EnableDevice<VESPERA_EthernetPort_Provider,
+            Invoke_Method_Status(const VESPERA_EthernetPort*, const Property<bool>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->Enabled, m->return_value);
     }
 
     if (strcasecmp(name, "OnlineDevice") == 0)
@@ -1774,7 +2032,9 @@ static sint32 _VESPERA_EthernetPort_Provider_invoke(
         if (!__is_record<VESPERA_EthernetPort_OnlineDevice_method>(method))
             return -1;
         VESPERA_EthernetPort_OnlineDevice_method* m = (VESPERA_EthernetPort_OnlineDevice_method*)method;
-        return provider->OnlineDevice(self, m->Online, m->return_value);
+        return __call_member<__member_OnlineDevice<VESPERA_EthernetPort_Provider,
+            Invoke_Method_Status(const VESPERA_EthernetPort*, const Property<bool>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->Online, m->return_value);
     }
 
     if (strcasecmp(name, "QuiesceDevice") == 0)
@@ -1783,7 +2043,9 @@ static sint32 _VESPERA_EthernetPort_Provider_invoke(
         if (!__is_record<VESPERA_EthernetPort_QuiesceDevice_method>(method))
             return -1;
         VESPERA_EthernetPort_QuiesceDevice_method* m = (VESPERA_EthernetPort_QuiesceDevice_method*)method;
-        return provider->QuiesceDevice(self, m->Quiesce, m->return_value);
+        return __call_member<__member_QuiesceDevice<VESPERA_EthernetPort_Provider,
+            Invoke_Method_Status(const VESPERA_EthernetPort*, const Property<bool>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->Quiesce, m->return_value);
     }
 
     if (strcasecmp(name, "SaveProperties") == 0)
@@ -1792,7 +2054,9 @@ static sint32 _VESPERA_EthernetPort_Provider_invoke(
         if (!__is_record<VESPERA_EthernetPort_SaveProperties_method>(method))
             return -1;
         VESPERA_EthernetPort_SaveProperties_method* m = (VESPERA_EthernetPort_SaveProperties_method*)method;
-        return provider->SaveProperties(self, m->return_value);
+        return __call_member<__member_SaveProperties<VESPERA_EthernetPort_Provider,
+            Invoke_Method_Status(const VESPERA_EthernetPort*, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->return_value);
     }
 
     if (strcasecmp(name, "RestoreProperties") == 0)
@@ -1801,7 +2065,9 @@ static sint32 _VESPERA_EthernetPort_Provider_invoke(
         if (!__is_record<VESPERA_EthernetPort_RestoreProperties_method>(method))
             return -1;
         VESPERA_EthernetPort_RestoreProperties_method* m = (VESPERA_EthernetPort_RestoreProperties_method*)method;
-        return provider->RestoreProperties(self, m->return_value);
+        return __call_member<__member_RestoreProperties<VESPERA_EthernetPort_Provider,
+            Invoke_Method_Status(const VESPERA_EthernetPort*, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->return_value);
     }
 
     return -1;
@@ -1923,7 +2189,9 @@ static sint32 _VESPERA_MemoryDiagnosticTest_Provider_invoke(
         if (!__is_record<VESPERA_MemoryDiagnosticTest_RequestStateChange_method>(method))
             return -1;
         VESPERA_MemoryDiagnosticTest_RequestStateChange_method* m = (VESPERA_MemoryDiagnosticTest_RequestStateChange_method*)method;
-        return provider->RequestStateChange(self, m->RequestedState, m->Job, m->TimeoutPeriod, m->return_value);
+        return __call_member<__member_RequestStateChange<VESPERA_MemoryDiagnosticTest_Provider,
+            Invoke_Method_Status(const VESPERA_MemoryDiagnosticTest*, const Property<uint16>&, CIM_ConcreteJob*&, const Property<Datetime>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->RequestedState, m->Job, m->TimeoutPeriod, m->return_value);
     }
 
     if (strcasecmp(name, "StartService") == 0)
@@ -1932,7 +2200,9 @@ static sint32 _VESPERA_MemoryDiagnosticTest_Provider_invoke(
         if (!__is_record<VESPERA_MemoryDiagnosticTest_StartService_method>(method))
             return -1;
         VESPERA_MemoryDiagnosticTest_StartService_method* m = (VESPERA_MemoryDiagnosticTest_StartService_method*)method;
-        return provider->StartService(self, m->return_value);
+        return __call_member<__member_StartService<VESPERA_MemoryDiagnosticTest_Provider,
+            Invoke_Method_Status(const VESPERA_MemoryDiagnosticTest*, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->return_value);
     }
 
     if (strcasecmp(name, "StopService") == 0)
@@ -1941,7 +2211,9 @@ static sint32 _VESPERA_MemoryDiagnosticTest_Provider_invoke(
         if (!__is_record<VESPERA_MemoryDiagnosticTest_StopService_method>(method))
             return -1;
         VESPERA_MemoryDiagnosticTest_StopService_method* m = (VESPERA_MemoryDiagnosticTest_StopService_method*)method;
-        return provider->StopService(self, m->return_value);
+        return __call_member<__member_StopService<VESPERA_MemoryDiagnosticTest_Provider,
+            Invoke_Method_Status(const VESPERA_MemoryDiagnosticTest*, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->return_value);
     }
 
     if (strcasecmp(name, "ChangeAffectedElementsAssignedSequence") == 0)
@@ -1950,7 +2222,9 @@ static sint32 _VESPERA_MemoryDiagnosticTest_Provider_invoke(
         if (!__is_record<VESPERA_MemoryDiagnosticTest_ChangeAffectedElementsAssignedSequence_method>(method))
             return -1;
         VESPERA_MemoryDiagnosticTest_ChangeAffectedElementsAssignedSequence_method* m = (VESPERA_MemoryDiagnosticTest_ChangeAffectedElementsAssignedSequence_method*)method;
-        return provider->ChangeAffectedElementsAssignedSequence(self, m->ManagedElements, m->AssignedSequence, m->Job, m->return_value);
+        return __call_member<__member_ChangeAffectedElementsAssignedSequence<VESPERA_MemoryDiagnosticTest_Provider,
+            Invoke_Method_Status(const VESPERA_MemoryDiagnosticTest*, const Property<Array<CIM_ManagedElement*> >&, const Property<Array<uint16> >&, CIM_ConcreteJob*&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->ManagedElements, m->AssignedSequence, m->Job, m->return_value);
     }
 
     if (strcasecmp(name, "RunDiagnostic") == 0)
@@ -1959,7 +2233,9 @@ static sint32 _VESPERA_MemoryDiagnosticTest_Provider_invoke(
         if (!__is_record<VESPERA_MemoryDiagnosticTest_RunDiagnostic_method>(method))
             return -1;
         VESPERA_MemoryDiagnosticTest_RunDiagnostic_method* m = (VESPERA_MemoryDiagnosticTest_RunDiagnostic_method*)method;
-        return provider->RunDiagnostic(self, m->ManagedElement, m->DiagSetting, m->JobSetting, m->Job, m->return_value);
+        return __call_member<__member_RunDiagnostic<VESPERA_MemoryDiagnosticTest_Provider,
+            Invoke_Method_Status(const VESPERA_MemoryDiagnosticTest*, const CIM_ManagedElement*, const CIM_DiagnosticSetting*, const CIM_JobSettingData*, CIM_ConcreteJob*&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->ManagedElement, m->DiagSetting, m->JobSetting, m->Job, m->return_value);
     }
 
     if (strcasecmp(name, "RunDiagnosticService") == 0)
@@ -1968,7 +2244,9 @@ static sint32 _VESPERA_MemoryDiagnosticTest_Provider_invoke(
         if (!__is_record<VESPERA_MemoryDiagnosticTest_RunDiagnosticService_method>(method))
             return -1;
         VESPERA_MemoryDiagnosticTest_RunDiagnosticService_method* m = (VESPERA_MemoryDiagnosticTest_RunDiagnosticService_method*)method;
-        return provider->RunDiagnosticService(self, m->ManagedElement, m->DiagnosticSettings, m->JobSettings, m->Job, m->return_value);
+        return __call_member<__member_RunDiagnosticService<VESPERA_MemoryDiagnosticTest_Provider,
+            Invoke_Method_Status(const VESPERA_MemoryDiagnosticTest*, const CIM_ManagedElement*, const Property<String>&, const Property<String>&, CIM_ConcreteJob*&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->ManagedElement, m->DiagnosticSettings, m->JobSettings, m->Job, m->return_value);
     }
 
     if (strcasecmp(name, "RunTest") == 0)
@@ -1977,7 +2255,9 @@ static sint32 _VESPERA_MemoryDiagnosticTest_Provider_invoke(
         if (!__is_record<VESPERA_MemoryDiagnosticTest_RunTest_method>(method))
             return -1;
         VESPERA_MemoryDiagnosticTest_RunTest_method* m = (VESPERA_MemoryDiagnosticTest_RunTest_method*)method;
-        return provider->RunTest(self, m->SystemElement, m->Setting, m->Result, m->return_value);
+        return __call_member<__member_RunTest<VESPERA_MemoryDiagnosticTest_Provider,
+            Invoke_Method_Status(const VESPERA_MemoryDiagnosticTest*, const CIM_ManagedSystemElement*, const CIM_DiagnosticSetting*, CIM_DiagnosticResult*&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->SystemElement, m->Setting, m->Result, m->return_value);
     }
 
     if (strcasecmp(name, "ClearResults") == 0)
@@ -1986,7 +2266,9 @@ static sint32 _VESPERA_MemoryDiagnosticTest_Provider_invoke(
         if (!__is_record<VESPERA_MemoryDiagnosticTest_ClearResults_method>(method))
             return -1;
         VESPERA_MemoryDiagnosticTest_ClearResults_method* m = (VESPERA_MemoryDiagnosticTest_ClearResults_method*)method;
-        return provider->ClearResults(self, m->SystemElement, m->ResultsNotCleared, m->return_value);
+        return __call_member<__member_ClearResults<VESPERA_MemoryDiagnosticTest_Provider,
+            Invoke_Method_Status(const VESPERA_MemoryDiagnosticTest*, const CIM_ManagedSystemElement*, Property<Array<String> >&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->SystemElement, m->ResultsNotCleared, m->return_value);
     }
 
     if (strcasecmp(name, "DiscontinueTest") == 0)
@@ -1995,7 +2277,9 @@ static sint32 _VESPERA_MemoryDiagnosticTest_Provider_invoke(
         if (!__is_record<VESPERA_MemoryDiagnosticTest_DiscontinueTest_method>(method))
             return -1;
         VESPERA_MemoryDiagnosticTest_DiscontinueTest_method* m = (VESPERA_MemoryDiagnosticTest_DiscontinueTest_method*)method;
-        return provider->DiscontinueTest(self, m->SystemElement, m->Result, m->TestingStopped, m->return_value);
+        return __call_member<__member_DiscontinueTest<VESPERA_MemoryDiagnosticTest_Provider,
+            Invoke_Method_Status(const VESPERA_MemoryDiagnosticTest*, const CIM_ManagedSystemElement*, const CIM_DiagnosticResult*, Property<bool>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->SystemElement, m->Result, m->TestingStopped, m->return_value);
     }
 
     return -1;
@@ -2037,7 +2321,9 @@ static sint32 _VESPERA_LoopbackDiagnosticTest_Provider_invoke(
         if (!__is_record<VESPERA_LoopbackDiagnosticTest_RequestStateChange_method>(method))
             return -1;
         VESPERA_LoopbackDiagnosticTest_RequestStateChange_method* m = (VESPERA_LoopbackDiagnosticTest_RequestStateChange_method*)method;
-        return provider->RequestStateChange(self, m->RequestedState, m->Job, m->TimeoutPeriod, m->return_value);
+        return __call_member<__member_RequestStateChange<VESPERA_LoopbackDiagnosticTest_Provider,
+            Invoke_Method_Status(const VESPERA_LoopbackDiagnosticTest*, const Property<uint16>&, CIM_ConcreteJob*&, const Property<Datetime>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->RequestedState, m->Job, m->TimeoutPeriod, m->return_value);
     }
 
     if (strcasecmp(name, "StartService") == 0)
@@ -2046,7 +2332,9 @@ static sint32 _VESPERA_LoopbackDiagnosticTest_Provider_invoke(
         if (!__is_record<VESPERA_LoopbackDiagnosticTest_StartService_method>(method))
             return -1;
         VESPERA_LoopbackDiagnosticTest_StartService_method* m = (VESPERA_LoopbackDiagnosticTest_StartService_method*)method;
-        return provider->StartService(self, m->return_value);
+        return __call_member<__member_StartService<VESPERA_LoopbackDiagnosticTest_Provider,
+            Invoke_Method_Status(const VESPERA_LoopbackDiagnosticTest*, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->return_value);
     }
 
     if (strcasecmp(name, "StopService") == 0)
@@ -2055,7 +2343,9 @@ static sint32 _VESPERA_LoopbackDiagnosticTest_Provider_invoke(
         if (!__is_record<VESPERA_LoopbackDiagnosticTest_StopService_method>(method))
             return -1;
         VESPERA_LoopbackDiagnosticTest_StopService_method* m = (VESPERA_LoopbackDiagnosticTest_StopService_method*)method;
-        return provider->StopService(self, m->return_value);
+        return __call_member<__member_StopService<VESPERA_LoopbackDiagnosticTest_Provider,
+            Invoke_Method_Status(const VESPERA_LoopbackDiagnosticTest*, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->return_value);
     }
 
     if (strcasecmp(name, "ChangeAffectedElementsAssignedSequence") == 0)
@@ -2064,7 +2354,9 @@ static sint32 _VESPERA_LoopbackDiagnosticTest_Provider_invoke(
         if (!__is_record<VESPERA_LoopbackDiagnosticTest_ChangeAffectedElementsAssignedSequence_method>(method))
             return -1;
         VESPERA_LoopbackDiagnosticTest_ChangeAffectedElementsAssignedSequence_method* m = (VESPERA_LoopbackDiagnosticTest_ChangeAffectedElementsAssignedSequence_method*)method;
-        return provider->ChangeAffectedElementsAssignedSequence(self, m->ManagedElements, m->AssignedSequence, m->Job, m->return_value);
+        return __call_member<__member_ChangeAffectedElementsAssignedSequence<VESPERA_LoopbackDiagnosticTest_Provider,
+            Invoke_Method_Status(const VESPERA_LoopbackDiagnosticTest*, const Property<Array<CIM_ManagedElement*> >&, const Property<Array<uint16> >&, CIM_ConcreteJob*&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->ManagedElements, m->AssignedSequence, m->Job, m->return_value);
     }
 
     if (strcasecmp(name, "RunDiagnostic") == 0)
@@ -2073,7 +2365,9 @@ static sint32 _VESPERA_LoopbackDiagnosticTest_Provider_invoke(
         if (!__is_record<VESPERA_LoopbackDiagnosticTest_RunDiagnostic_method>(method))
             return -1;
         VESPERA_LoopbackDiagnosticTest_RunDiagnostic_method* m = (VESPERA_LoopbackDiagnosticTest_RunDiagnostic_method*)method;
-        return provider->RunDiagnostic(self, m->ManagedElement, m->DiagSetting, m->JobSetting, m->Job, m->return_value);
+        return __call_member<__member_RunDiagnostic<VESPERA_LoopbackDiagnosticTest_Provider,
+            Invoke_Method_Status(const VESPERA_LoopbackDiagnosticTest*, const CIM_ManagedElement*, const CIM_DiagnosticSetting*, const CIM_JobSettingData*, CIM_ConcreteJob*&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->ManagedElement, m->DiagSetting, m->JobSetting, m->Job, m->return_value);
     }
 
     if (strcasecmp(name, "RunDiagnosticService") == 0)
@@ -2082,7 +2376,9 @@ static sint32 _VESPERA_LoopbackDiagnosticTest_Provider_invoke(
         if (!__is_record<VESPERA_LoopbackDiagnosticTest_RunDiagnosticService_method>(method))
             return -1;
         VESPERA_LoopbackDiagnosticTest_RunDiagnosticService_method* m = (VESPERA_LoopbackDiagnosticTest_RunDiagnosticService_method*)method;
-        return provider->RunDiagnosticService(self, m->ManagedElement, m->DiagnosticSettings, m->JobSettings, m->Job, m->return_value);
+        return __call_member<__member_RunDiagnosticService<VESPERA_LoopbackDiagnosticTest_Provider,
+            Invoke_Method_Status(const VESPERA_LoopbackDiagnosticTest*, const CIM_ManagedElement*, const Property<String>&, const Property<String>&, CIM_ConcreteJob*&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->ManagedElement, m->DiagnosticSettings, m->JobSettings, m->Job, m->return_value);
     }
 
     if (strcasecmp(name, "RunTest") == 0)
@@ -2091,7 +2387,9 @@ static sint32 _VESPERA_LoopbackDiagnosticTest_Provider_invoke(
         if (!__is_record<VESPERA_LoopbackDiagnosticTest_RunTest_method>(method))
             return -1;
         VESPERA_LoopbackDiagnosticTest_RunTest_method* m = (VESPERA_LoopbackDiagnosticTest_RunTest_method*)method;
-        return provider->RunTest(self, m->SystemElement, m->Setting, m->Result, m->return_value);
+        return __call_member<__member_RunTest<VESPERA_LoopbackDiagnosticTest_Provider,
+            Invoke_Method_Status(const VESPERA_LoopbackDiagnosticTest*, const CIM_ManagedSystemElement*, const CIM_DiagnosticSetting*, CIM_DiagnosticResult*&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->SystemElement, m->Setting, m->Result, m->return_value);
     }
 
     if (strcasecmp(name, "ClearResults") == 0)
@@ -2100,7 +2398,9 @@ static sint32 _VESPERA_LoopbackDiagnosticTest_Provider_invoke(
         if (!__is_record<VESPERA_LoopbackDiagnosticTest_ClearResults_method>(method))
             return -1;
         VESPERA_LoopbackDiagnosticTest_ClearResults_method* m = (VESPERA_LoopbackDiagnosticTest_ClearResults_method*)method;
-        return provider->ClearResults(self, m->SystemElement, m->ResultsNotCleared, m->return_value);
+        return __call_member<__member_ClearResults<VESPERA_LoopbackDiagnosticTest_Provider,
+            Invoke_Method_Status(const VESPERA_LoopbackDiagnosticTest*, const CIM_ManagedSystemElement*, Property<Array<String> >&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->SystemElement, m->ResultsNotCleared, m->return_value);
     }
 
     if (strcasecmp(name, "DiscontinueTest") == 0)
@@ -2109,7 +2409,9 @@ static sint32 _VESPERA_LoopbackDiagnosticTest_Provider_invoke(
         if (!__is_record<VESPERA_LoopbackDiagnosticTest_DiscontinueTest_method>(method))
             return -1;
         VESPERA_LoopbackDiagnosticTest_DiscontinueTest_method* m = (VESPERA_LoopbackDiagnosticTest_DiscontinueTest_method*)method;
-        return provider->DiscontinueTest(self, m->SystemElement, m->Result, m->TestingStopped, m->return_value);
+        return __call_member<__member_DiscontinueTest<VESPERA_LoopbackDiagnosticTest_Provider,
+            Invoke_Method_Status(const VESPERA_LoopbackDiagnosticTest*, const CIM_ManagedSystemElement*, const CIM_DiagnosticResult*, Property<bool>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->SystemElement, m->Result, m->TestingStopped, m->return_value);
     }
 
     return -1;
@@ -2151,7 +2453,9 @@ static sint32 _VESPERA_PCILoopbackDiagnosticTest_Provider_invoke(
         if (!__is_record<VESPERA_PCILoopbackDiagnosticTest_RequestStateChange_method>(method))
             return -1;
         VESPERA_PCILoopbackDiagnosticTest_RequestStateChange_method* m = (VESPERA_PCILoopbackDiagnosticTest_RequestStateChange_method*)method;
-        return provider->RequestStateChange(self, m->RequestedState, m->Job, m->TimeoutPeriod, m->return_value);
+        return __call_member<__member_RequestStateChange<VESPERA_PCILoopbackDiagnosticTest_Provider,
+            Invoke_Method_Status(const VESPERA_PCILoopbackDiagnosticTest*, const Property<uint16>&, CIM_ConcreteJob*&, const Property<Datetime>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->RequestedState, m->Job, m->TimeoutPeriod, m->return_value);
     }
 
     if (strcasecmp(name, "StartService") == 0)
@@ -2160,7 +2464,9 @@ static sint32 _VESPERA_PCILoopbackDiagnosticTest_Provider_invoke(
         if (!__is_record<VESPERA_PCILoopbackDiagnosticTest_StartService_method>(method))
             return -1;
         VESPERA_PCILoopbackDiagnosticTest_StartService_method* m = (VESPERA_PCILoopbackDiagnosticTest_StartService_method*)method;
-        return provider->StartService(self, m->return_value);
+        return __call_member<__member_StartService<VESPERA_PCILoopbackDiagnosticTest_Provider,
+            Invoke_Method_Status(const VESPERA_PCILoopbackDiagnosticTest*, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->return_value);
     }
 
     if (strcasecmp(name, "StopService") == 0)
@@ -2169,7 +2475,9 @@ static sint32 _VESPERA_PCILoopbackDiagnosticTest_Provider_invoke(
         if (!__is_record<VESPERA_PCILoopbackDiagnosticTest_StopService_method>(method))
             return -1;
         VESPERA_PCILoopbackDiagnosticTest_StopService_method* m = (VESPERA_PCILoopbackDiagnosticTest_StopService_method*)method;
-        return provider->StopService(self, m->return_value);
+        return __call_member<__member_StopService<VESPERA_PCILoopbackDiagnosticTest_Provider,
+            Invoke_Method_Status(const VESPERA_PCILoopbackDiagnosticTest*, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->return_value);
     }
 
     if (strcasecmp(name, "ChangeAffectedElementsAssignedSequence") == 0)
@@ -2178,7 +2486,9 @@ static sint32 _VESPERA_PCILoopbackDiagnosticTest_Provider_invoke(
         if (!__is_record<VESPERA_PCILoopbackDiagnosticTest_ChangeAffectedElementsAssignedSequence_method>(method))
             return -1;
         VESPERA_PCILoopbackDiagnosticTest_ChangeAffectedElementsAssignedSequence_method* m = (VESPERA_PCILoopbackDiagnosticTest_ChangeAffectedElementsAssignedSequence_method*)method;
-        return provider->ChangeAffectedElementsAssignedSequence(self, m->ManagedElements, m->AssignedSequence, m->Job, m->return_value);
+        return __call_member<__member_ChangeAffectedElementsAssignedSequence<VESPERA_PCILoopbackDiagnosticTest_Provider,
+            Invoke_Method_Status(const VESPERA_PCILoopbackDiagnosticTest*, const Property<Array<CIM_ManagedElement*> >&, const Property<Array<uint16> >&, CIM_ConcreteJob*&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->ManagedElements, m->AssignedSequence, m->Job, m->return_value);
     }
 
     if (strcasecmp(name, "RunDiagnostic") == 0)
@@ -2187,7 +2497,9 @@ static sint32 _VESPERA_PCILoopbackDiagnosticTest_Provider_invoke(
         if (!__is_record<VESPERA_PCILoopbackDiagnosticTest_RunDiagnostic_method>(method))
             return -1;
         VESPERA_PCILoopbackDiagnosticTest_RunDiagnostic_method* m = (VESPERA_PCILoopbackDiagnosticTest_RunDiagnostic_method*)method;
-        return provider->RunDiagnostic(self, m->ManagedElement, m->DiagSetting, m->JobSetting, m->Job, m->return_value);
+        return __call_member<__member_RunDiagnostic<VESPERA_PCILoopbackDiagnosticTest_Provider,
+            Invoke_Method_Status(const VESPERA_PCILoopbackDiagnosticTest*, const CIM_ManagedElement*, const CIM_DiagnosticSetting*, const CIM_JobSettingData*, CIM_ConcreteJob*&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->ManagedElement, m->DiagSetting, m->JobSetting, m->Job, m->return_value);
     }
 
     if (strcasecmp(name, "RunDiagnosticService") == 0)
@@ -2196,7 +2508,9 @@ static sint32 _VESPERA_PCILoopbackDiagnosticTest_Provider_invoke(
         if (!__is_record<VESPERA_PCILoopbackDiagnosticTest_RunDiagnosticService_method>(method))
             return -1;
         VESPERA_PCILoopbackDiagnosticTest_RunDiagnosticService_method* m = (VESPERA_PCILoopbackDiagnosticTest_RunDiagnosticService_method*)method;
-        return provider->RunDiagnosticService(self, m->ManagedElement, m->DiagnosticSettings, m->JobSettings, m->Job, m->return_value);
+        return __call_member<__member_RunDiagnosticService<VESPERA_PCILoopbackDiagnosticTest_Provider,
+            Invoke_Method_Status(const VESPERA_PCILoopbackDiagnosticTest*, const CIM_ManagedElement*, const Property<String>&, const Property<String>&, CIM_ConcreteJob*&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->ManagedElement, m->DiagnosticSettings, m->JobSettings, m->Job, m->return_value);
     }
 
     if (strcasecmp(name, "RunTest") == 0)
@@ -2205,7 +2519,9 @@ static sint32 _VESPERA_PCILoopbackDiagnosticTest_Provider_invoke(
         if (!__is_record<VESPERA_PCILoopbackDiagnosticTest_RunTest_method>(method))
             return -1;
         VESPERA_PCILoopbackDiagnosticTest_RunTest_method* m = (VESPERA_PCILoopbackDiagnosticTest_RunTest_method*)method;
-        return provider->RunTest(self, m->SystemElement, m->Setting, m->Result, m->return_value);
+        return __call_member<__member_RunTest<VESPERA_PCILoopbackDiagnosticTest_Provider,
+            Invoke_Method_Status(const VESPERA_PCILoopbackDiagnosticTest*, const CIM_ManagedSystemElement*, const CIM_DiagnosticSetting*, CIM_DiagnosticResult*&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->SystemElement, m->Setting, m->Result, m->return_value);
     }
 
     if (strcasecmp(name, "ClearResults") == 0)
@@ -2214,7 +2530,9 @@ static sint32 _VESPERA_PCILoopbackDiagnosticTest_Provider_invoke(
         if (!__is_record<VESPERA_PCILoopbackDiagnosticTest_ClearResults_method>(method))
             return -1;
         VESPERA_PCILoopbackDiagnosticTest_ClearResults_method* m = (VESPERA_PCILoopbackDiagnosticTest_ClearResults_method*)method;
-        return provider->ClearResults(self, m->SystemElement, m->ResultsNotCleared, m->return_value);
+        return __call_member<__member_ClearResults<VESPERA_PCILoopbackDiagnosticTest_Provider,
+            Invoke_Method_Status(const VESPERA_PCILoopbackDiagnosticTest*, const CIM_ManagedSystemElement*, Property<Array<String> >&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->SystemElement, m->ResultsNotCleared, m->return_value);
     }
 
     if (strcasecmp(name, "DiscontinueTest") == 0)
@@ -2223,7 +2541,9 @@ static sint32 _VESPERA_PCILoopbackDiagnosticTest_Provider_invoke(
         if (!__is_record<VESPERA_PCILoopbackDiagnosticTest_DiscontinueTest_method>(method))
             return -1;
         VESPERA_PCILoopbackDiagnosticTest_DiscontinueTest_method* m = (VESPERA_PCILoopbackDiagnosticTest_DiscontinueTest_method*)method;
-        return provider->DiscontinueTest(self, m->SystemElement, m->Result, m->TestingStopped, m->return_value);
+        return __call_member<__member_DiscontinueTest<VESPERA_PCILoopbackDiagnosticTest_Provider,
+            Invoke_Method_Status(const VESPERA_PCILoopbackDiagnosticTest*, const CIM_ManagedSystemElement*, const CIM_DiagnosticResult*, Property<bool>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->SystemElement, m->Result, m->TestingStopped, m->return_value);
     }
 
     return -1;
@@ -2265,7 +2585,9 @@ static sint32 _VESPERA_EthLoopbackDiagnosticTest_Provider_invoke(
         if (!__is_record<VESPERA_EthLoopbackDiagnosticTest_RequestStateChange_method>(method))
             return -1;
         VESPERA_EthLoopbackDiagnosticTest_RequestStateChange_method* m = (VESPERA_EthLoopbackDiagnosticTest_RequestStateChange_method*)method;
-        return provider->RequestStateChange(self, m->RequestedState, m->Job, m->TimeoutPeriod, m->return_value);
+        return __call_member<__member_RequestStateChange<VESPERA_EthLoopbackDiagnosticTest_Provider,
+            Invoke_Method_Status(const VESPERA_EthLoopbackDiagnosticTest*, const Property<uint16>&, CIM_ConcreteJob*&, const Property<Datetime>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->RequestedState, m->Job, m->TimeoutPeriod, m->return_value);
     }
 
     if (strcasecmp(name, "StartService") == 0)
@@ -2274,7 +2596,9 @@ static sint32 _VESPERA_EthLoopbackDiagnosticTest_Provider_invoke(
         if (!__is_record<VESPERA_EthLoopbackDiagnosticTest_StartService_method>(method))
             return -1;
         VESPERA_EthLoopbackDiagnosticTest_StartService_method* m = (VESPERA_EthLoopbackDiagnosticTest_StartService_method*)method;
-        return provider->StartService(self, m->return_value);
+        return __call_member<__member_StartService<VESPERA_EthLoopbackDiagnosticTest_Provider,
+            Invoke_Method_Status(const VESPERA_EthLoopbackDiagnosticTest*, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->return_value);
     }
 
     if (strcasecmp(name, "StopService") == 0)
@@ -2283,7 +2607,9 @@ static sint32 _VESPERA_EthLoopbackDiagnosticTest_Provider_invoke(
         if (!__is_record<VESPERA_EthLoopbackDiagnosticTest_StopService_method>(method))
             return -1;
         VESPERA_EthLoopbackDiagnosticTest_StopService_method* m = (VESPERA_EthLoopbackDiagnosticTest_StopService_method*)method;
-        return provider->StopService(self, m->return_value);
+        return __call_member<__member_StopService<VESPERA_EthLoopbackDiagnosticTest_Provider,
+            Invoke_Method_Status(const VESPERA_EthLoopbackDiagnosticTest*, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->return_value);
     }
 
     if (strcasecmp(name, "ChangeAffectedElementsAssignedSequence") == 0)
@@ -2292,7 +2618,9 @@ static sint32 _VESPERA_EthLoopbackDiagnosticTest_Provider_invoke(
         if (!__is_record<VESPERA_EthLoopbackDiagnosticTest_ChangeAffectedElementsAssignedSequence_method>(method))
             return -1;
         VESPERA_EthLoopbackDiagnosticTest_ChangeAffectedElementsAssignedSequence_method* m = (VESPERA_EthLoopbackDiagnosticTest_ChangeAffectedElementsAssignedSequence_method*)method;
-        return provider->ChangeAffectedElementsAssignedSequence(self, m->ManagedElements, m->AssignedSequence, m->Job, m->return_value);
+        return __call_member<__member_ChangeAffectedElementsAssignedSequence<VESPERA_EthLoopbackDiagnosticTest_Provider,
+            Invoke_Method_Status(const VESPERA_EthLoopbackDiagnosticTest*, const Property<Array<CIM_ManagedElement*> >&, const Property<Array<uint16> >&, CIM_ConcreteJob*&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->ManagedElements, m->AssignedSequence, m->Job, m->return_value);
     }
 
     if (strcasecmp(name, "RunDiagnostic") == 0)
@@ -2301,7 +2629,9 @@ static sint32 _VESPERA_EthLoopbackDiagnosticTest_Provider_invoke(
         if (!__is_record<VESPERA_EthLoopbackDiagnosticTest_RunDiagnostic_method>(method))
             return -1;
         VESPERA_EthLoopbackDiagnosticTest_RunDiagnostic_method* m = (VESPERA_EthLoopbackDiagnosticTest_RunDiagnostic_method*)method;
-        return provider->RunDiagnostic(self, m->ManagedElement, m->DiagSetting, m->JobSetting, m->Job, m->return_value);
+        return __call_member<__member_RunDiagnostic<VESPERA_EthLoopbackDiagnosticTest_Provider,
+            Invoke_Method_Status(const VESPERA_EthLoopbackDiagnosticTest*, const CIM_ManagedElement*, const CIM_DiagnosticSetting*, const CIM_JobSettingData*, CIM_ConcreteJob*&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->ManagedElement, m->DiagSetting, m->JobSetting, m->Job, m->return_value);
     }
 
     if (strcasecmp(name, "RunDiagnosticService") == 0)
@@ -2310,7 +2640,9 @@ static sint32 _VESPERA_EthLoopbackDiagnosticTest_Provider_invoke(
         if (!__is_record<VESPERA_EthLoopbackDiagnosticTest_RunDiagnosticService_method>(method))
             return -1;
         VESPERA_EthLoopbackDiagnosticTest_RunDiagnosticService_method* m = (VESPERA_EthLoopbackDiagnosticTest_RunDiagnosticService_method*)method;
-        return provider->RunDiagnosticService(self, m->ManagedElement, m->DiagnosticSettings, m->JobSettings, m->Job, m->return_value);
+        return __call_member<__member_RunDiagnosticService<VESPERA_EthLoopbackDiagnosticTest_Provider,
+            Invoke_Method_Status(const VESPERA_EthLoopbackDiagnosticTest*, const CIM_ManagedElement*, const Property<String>&, const Property<String>&, CIM_ConcreteJob*&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->ManagedElement, m->DiagnosticSettings, m->JobSettings, m->Job, m->return_value);
     }
 
     if (strcasecmp(name, "RunTest") == 0)
@@ -2319,7 +2651,9 @@ static sint32 _VESPERA_EthLoopbackDiagnosticTest_Provider_invoke(
         if (!__is_record<VESPERA_EthLoopbackDiagnosticTest_RunTest_method>(method))
             return -1;
         VESPERA_EthLoopbackDiagnosticTest_RunTest_method* m = (VESPERA_EthLoopbackDiagnosticTest_RunTest_method*)method;
-        return provider->RunTest(self, m->SystemElement, m->Setting, m->Result, m->return_value);
+        return __call_member<__member_RunTest<VESPERA_EthLoopbackDiagnosticTest_Provider,
+            Invoke_Method_Status(const VESPERA_EthLoopbackDiagnosticTest*, const CIM_ManagedSystemElement*, const CIM_DiagnosticSetting*, CIM_DiagnosticResult*&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->SystemElement, m->Setting, m->Result, m->return_value);
     }
 
     if (strcasecmp(name, "ClearResults") == 0)
@@ -2328,7 +2662,9 @@ static sint32 _VESPERA_EthLoopbackDiagnosticTest_Provider_invoke(
         if (!__is_record<VESPERA_EthLoopbackDiagnosticTest_ClearResults_method>(method))
             return -1;
         VESPERA_EthLoopbackDiagnosticTest_ClearResults_method* m = (VESPERA_EthLoopbackDiagnosticTest_ClearResults_method*)method;
-        return provider->ClearResults(self, m->SystemElement, m->ResultsNotCleared, m->return_value);
+        return __call_member<__member_ClearResults<VESPERA_EthLoopbackDiagnosticTest_Provider,
+            Invoke_Method_Status(const VESPERA_EthLoopbackDiagnosticTest*, const CIM_ManagedSystemElement*, Property<Array<String> >&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->SystemElement, m->ResultsNotCleared, m->return_value);
     }
 
     if (strcasecmp(name, "DiscontinueTest") == 0)
@@ -2337,7 +2673,9 @@ static sint32 _VESPERA_EthLoopbackDiagnosticTest_Provider_invoke(
         if (!__is_record<VESPERA_EthLoopbackDiagnosticTest_DiscontinueTest_method>(method))
             return -1;
         VESPERA_EthLoopbackDiagnosticTest_DiscontinueTest_method* m = (VESPERA_EthLoopbackDiagnosticTest_DiscontinueTest_method*)method;
-        return provider->DiscontinueTest(self, m->SystemElement, m->Result, m->TestingStopped, m->return_value);
+        return __call_member<__member_DiscontinueTest<VESPERA_EthLoopbackDiagnosticTest_Provider,
+            Invoke_Method_Status(const VESPERA_EthLoopbackDiagnosticTest*, const CIM_ManagedSystemElement*, const CIM_DiagnosticResult*, Property<bool>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->SystemElement, m->Result, m->TestingStopped, m->return_value);
     }
 
     return -1;
@@ -2399,7 +2737,9 @@ static sint32 _VESPERA_ConcreteJob_Provider_invoke(
         if (!__is_record<VESPERA_ConcreteJob_KillJob_method>(method))
             return -1;
         VESPERA_ConcreteJob_KillJob_method* m = (VESPERA_ConcreteJob_KillJob_method*)method;
-        return provider->KillJob(self, m->DeleteOnKill, m->return_value);
+        return __call_member<__member_KillJob<VESPERA_ConcreteJob_Provider,
+            Invoke_Method_Status(const VESPERA_ConcreteJob*, const Property<bool>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->DeleteOnKill, m->return_value);
     }
 
     if (strcasecmp(name, "RequestStateChange") == 0)
@@ -2408,7 +2748,9 @@ static sint32 _VESPERA_ConcreteJob_Provider_invoke(
         if (!__is_record<VESPERA_ConcreteJob_RequestStateChange_method>(method))
             return -1;
         VESPERA_ConcreteJob_RequestStateChange_method* m = (VESPERA_ConcreteJob_RequestStateChange_method*)method;
-        return provider->RequestStateChange(self, m->RequestedState, m->TimeoutPeriod, m->return_value);
+        return __call_member<__member_RequestStateChange<VESPERA_ConcreteJob_Provider,
+            Invoke_Method_Status(const VESPERA_ConcreteJob*, const Property<uint16>&, const Property<Datetime>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->RequestedState, m->TimeoutPeriod, m->return_value);
     }
 
     if (strcasecmp(name, "GetError") == 0)
@@ -2417,7 +2759,9 @@ static sint32 _VESPERA_ConcreteJob_Provider_invoke(
         if (!__is_record<VESPERA_ConcreteJob_GetError_method>(method))
             return -1;
         VESPERA_ConcreteJob_GetError_method* m = (VESPERA_ConcreteJob_GetError_method*)method;
-        return provider->GetError(self, m->Error, m->return_value);
+        return __call_member<__member_GetError<VESPERA_ConcreteJob_Provider,
+            Invoke_Method_Status(const VESPERA_ConcreteJob*, Property<String>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->Error, m->return_value);
     }
 
     if (strcasecmp(name, "GetErrors") == 0)
@@ -2426,7 +2770,9 @@ static sint32 _VESPERA_ConcreteJob_Provider_invoke(
         if (!__is_record<VESPERA_ConcreteJob_GetErrors_method>(method))
             return -1;
         VESPERA_ConcreteJob_GetErrors_method* m = (VESPERA_ConcreteJob_GetErrors_method*)method;
-        return provider->GetErrors(self, m->Errors, m->return_value);
+        return __call_member<__member_GetErrors<VESPERA_ConcreteJob_Provider,
+            Invoke_Method_Status(const VESPERA_ConcreteJob*, Property<Array<String> >&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->Errors, m->return_value);
     }
 
     return -1;
@@ -2808,7 +3154,9 @@ static sint32 _VESPERA_LANEndpoint_Provider_invoke(
         if (!__is_record<VESPERA_LANEndpoint_RequestStateChange_method>(method))
             return -1;
         VESPERA_LANEndpoint_RequestStateChange_method* m = (VESPERA_LANEndpoint_RequestStateChange_method*)method;
-        return provider->RequestStateChange(self, m->RequestedState, m->Job, m->TimeoutPeriod, m->return_value);
+        return __call_member<__member_RequestStateChange<VESPERA_LANEndpoint_Provider,
+            Invoke_Method_Status(const VESPERA_LANEndpoint*, const Property<uint16>&, CIM_ConcreteJob*&, const Property<Datetime>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->RequestedState, m->Job, m->TimeoutPeriod, m->return_value);
     }
 
     if (strcasecmp(name, "BroadcastReset") == 0)
@@ -2817,7 +3165,9 @@ static sint32 _VESPERA_LANEndpoint_Provider_invoke(
         if (!__is_record<VESPERA_LANEndpoint_BroadcastReset_method>(method))
             return -1;
         VESPERA_LANEndpoint_BroadcastReset_method* m = (VESPERA_LANEndpoint_BroadcastReset_method*)method;
-        return provider->BroadcastReset(self, m->return_value);
+        return __call_member<__member_BroadcastReset<VESPERA_LANEndpoint_Provider,
+            Invoke_Method_Status(const VESPERA_LANEndpoint*, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->return_value);
     }
 
     return -1;
@@ -2899,7 +3249,9 @@ static sint32 _VESPERA_AlarmDevice_Provider_invoke(
         if (!__is_record<VESPERA_AlarmDevice_RequestStateChange_method>(method))
             return -1;
         VESPERA_AlarmDevice_RequestStateChange_method* m = (VESPERA_AlarmDevice_RequestStateChange_method*)method;
-        return provider->RequestStateChange(self, m->RequestedState, m->Job, m->TimeoutPeriod, m->return_value);
+        return __call_member<__member_RequestStateChange<VESPERA_AlarmDevice_Provider,
+            Invoke_Method_Status(const VESPERA_AlarmDevice*, const Property<uint16>&, CIM_ConcreteJob*&, const Property<Datetime>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->RequestedState, m->Job, m->TimeoutPeriod, m->return_value);
     }
 
     if (strcasecmp(name, "SetPowerState") == 0)
@@ -2908,7 +3260,9 @@ static sint32 _VESPERA_AlarmDevice_Provider_invoke(
         if (!__is_record<VESPERA_AlarmDevice_SetPowerState_method>(method))
             return -1;
         VESPERA_AlarmDevice_SetPowerState_method* m = (VESPERA_AlarmDevice_SetPowerState_method*)method;
-        return provider->SetPowerState(self, m->PowerState, m->Time, m->return_value);
+        return __call_member<__member_SetPowerState<VESPERA_AlarmDevice_Provider,
+            Invoke_Method_Status(const VESPERA_AlarmDevice*, const Property<uint16>&, const Property<Datetime>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->PowerState, m->Time, m->return_value);
     }
 
     if (strcasecmp(name, "Reset") == 0)
@@ -2917,7 +3271,9 @@ static sint32 _VESPERA_AlarmDevice_Provider_invoke(
         if (!__is_record<VESPERA_AlarmDevice_Reset_method>(method))
             return -1;
         VESPERA_AlarmDevice_Reset_method* m = (VESPERA_AlarmDevice_Reset_method*)method;
-        return provider->Reset(self, m->return_value);
+        return __call_member<__member_Reset<VESPERA_AlarmDevice_Provider,
+            Invoke_Method_Status(const VESPERA_AlarmDevice*, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->return_value);
     }
 
     if (strcasecmp(name, "EnableDevice") == 0)
@@ -2926,7 +3282,9 @@ static sint32 _VESPERA_AlarmDevice_Provider_invoke(
         if (!__is_record<VESPERA_AlarmDevice_EnableDevice_method>(method))
             return -1;
         VESPERA_AlarmDevice_EnableDevice_method* m = (VESPERA_AlarmDevice_EnableDevice_method*)method;
-        return provider->EnableDevice(self, m->Enabled, m->return_value);
+        return __call_member<__member_EnableDevice<VESPERA_AlarmDevice_Provider,
+            Invoke_Method_Status(const VESPERA_AlarmDevice*, const Property<bool>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->Enabled, m->return_value);
     }
 
     if (strcasecmp(name, "OnlineDevice") == 0)
@@ -2935,7 +3293,9 @@ static sint32 _VESPERA_AlarmDevice_Provider_invoke(
         if (!__is_record<VESPERA_AlarmDevice_OnlineDevice_method>(method))
             return -1;
         VESPERA_AlarmDevice_OnlineDevice_method* m = (VESPERA_AlarmDevice_OnlineDevice_method*)method;
-        return provider->OnlineDevice(self, m->Online, m->return_value);
+        return __call_member<__member_OnlineDevice<VESPERA_AlarmDevice_Provider,
+            Invoke_Method_Status(const VESPERA_AlarmDevice*, const Property<bool>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->Online, m->return_value);
     }
 
     if (strcasecmp(name, "QuiesceDevice") == 0)
@@ -2944,7 +3304,9 @@ static sint32 _VESPERA_AlarmDevice_Provider_invoke(
         if (!__is_record<VESPERA_AlarmDevice_QuiesceDevice_method>(method))
             return -1;
         VESPERA_AlarmDevice_QuiesceDevice_method* m = (VESPERA_AlarmDevice_QuiesceDevice_method*)method;
-        return provider->QuiesceDevice(self, m->Quiesce, m->return_value);
+        return __call_member<__member_QuiesceDevice<VESPERA_AlarmDevice_Provider,
+            Invoke_Method_Status(const VESPERA_AlarmDevice*, const Property<bool>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->Quiesce, m->return_value);
     }
 
     if (strcasecmp(name, "SaveProperties") == 0)
@@ -2953,7 +3315,9 @@ static sint32 _VESPERA_AlarmDevice_Provider_invoke(
         if (!__is_record<VESPERA_AlarmDevice_SaveProperties_method>(method))
             return -1;
         VESPERA_AlarmDevice_SaveProperties_method* m = (VESPERA_AlarmDevice_SaveProperties_method*)method;
-        return provider->SaveProperties(self, m->return_value);
+        return __call_member<__member_SaveProperties<VESPERA_AlarmDevice_Provider,
+            Invoke_Method_Status(const VESPERA_AlarmDevice*, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->return_value);
     }
 
     if (strcasecmp(name, "RestoreProperties") == 0)
@@ -2962,7 +3326,9 @@ static sint32 _VESPERA_AlarmDevice_Provider_invoke(
         if (!__is_record<VESPERA_AlarmDevice_RestoreProperties_method>(method))
             return -1;
         VESPERA_AlarmDevice_RestoreProperties_method* m = (VESPERA_AlarmDevice_RestoreProperties_method*)method;
-        return provider->RestoreProperties(self, m->return_value);
+        return __call_member<__member_RestoreProperties<VESPERA_AlarmDevice_Provider,
+            Invoke_Method_Status(const VESPERA_AlarmDevice*, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->return_value);
     }
 
     if (strcasecmp(name, "SetAlarmState") == 0)
@@ -2971,7 +3337,9 @@ static sint32 _VESPERA_AlarmDevice_Provider_invoke(
         if (!__is_record<VESPERA_AlarmDevice_SetAlarmState_method>(method))
             return -1;
         VESPERA_AlarmDevice_SetAlarmState_method* m = (VESPERA_AlarmDevice_SetAlarmState_method*)method;
-        return provider->SetAlarmState(self, m->RequestedAlarmState, m->return_value);
+        return __call_member<__member_SetAlarmState<VESPERA_AlarmDevice_Provider,
+            Invoke_Method_Status(const VESPERA_AlarmDevice*, const Property<uint16>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->RequestedAlarmState, m->return_value);
     }
 
     if (strcasecmp(name, "SetAlarmIndicator") == 0)
@@ -2980,7 +3348,9 @@ static sint32 _VESPERA_AlarmDevice_Provider_invoke(
         if (!__is_record<VESPERA_AlarmDevice_SetAlarmIndicator_method>(method))
             return -1;
         VESPERA_AlarmDevice_SetAlarmIndicator_method* m = (VESPERA_AlarmDevice_SetAlarmIndicator_method*)method;
-        return provider->SetAlarmIndicator(self, m->AudioIndicator, m->VisualIndicator, m->MotionIndicator, m->return_value);
+        return __call_member<__member_SetAlarmIndicator<VESPERA_AlarmDevice_Provider,
+            Invoke_Method_Status(const VESPERA_AlarmDevice*, const Property<uint16>&, const Property<uint16>&, const Property<uint16>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->AudioIndicator, m->VisualIndicator, m->MotionIndicator, m->return_value);
     }
 
     if (strcasecmp(name, "SetUrgency") == 0)
@@ -2989,7 +3359,9 @@ static sint32 _VESPERA_AlarmDevice_Provider_invoke(
         if (!__is_record<VESPERA_AlarmDevice_SetUrgency_method>(method))
             return -1;
         VESPERA_AlarmDevice_SetUrgency_method* m = (VESPERA_AlarmDevice_SetUrgency_method*)method;
-        return provider->SetUrgency(self, m->RequestedUrgency, m->return_value);
+        return __call_member<__member_SetUrgency<VESPERA_AlarmDevice_Provider,
+            Invoke_Method_Status(const VESPERA_AlarmDevice*, const Property<uint16>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->RequestedUrgency, m->return_value);
     }
 
     return -1;
@@ -3071,7 +3443,9 @@ static sint32 _VESPERA_AgentService_Provider_invoke(
         if (!__is_record<VESPERA_AgentService_executeMethod_method>(method))
             return -1;
         VESPERA_AgentService_executeMethod_method* m = (VESPERA_AgentService_executeMethod_method*)method;
-        return provider->executeMethod(self, m->response, m->request, m->return_value);
+        return __call_member<__member_executeMethod<VESPERA_AgentService_Provider,
+            Invoke_Method_Status(const VESPERA_AgentService*, Property<String>&, const Property<String>&, Property<uint32>&)> >(
+            provider, INVOKE_METHOD_UNSUPPORTED, self, m->response, m->request, m->return_value);
     }
 
     return -1;
