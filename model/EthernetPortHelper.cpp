@@ -160,10 +160,17 @@ void EthernetPortHelper::fillFromEthData(const Json::Value& ethData,
     const char* dev = _textMember(ethData, "ethDev");
 
     if (dev)
+    {
         strlcpy(info->deviceName, dev, sizeof(info->deviceName));
+        info->noDeviceName = false;
+    }
     else
+    {
+        info->deviceName[0] = '\0';
+        info->noDeviceName = true;
         TLOG(LL_WARN, "No Ethernet device name for %.*s", macSize,
             info->macAddress);
+    }
 
     // A state goes out as a uint16 of OperationalStatus.
     if (!_uintMember(ethData, "ethPortStateMOFValue", info->state) ||
@@ -331,15 +338,8 @@ Array<Instance*> EthernetPortHelper::getInstancesByAdapterId(int adapterId,
         }
         else if (id == ID_VESPERA_LANEndpoint)
         {
-            // The device name is the endpoint's key: without one, two such
-            // ports would be the same endpoint to a client.
-            if (info.deviceName[0] == '\0')
-            {
-                TLOG(LL_ERR, "No LAN endpoint for %s without a device name",
-                    portIndex);
-                continue;
-            }
-
+            // A port without a device name still is an endpoint; its key
+            // is then the empty name.
             result.append(getLANEndpointInstance(info));
         }
         else
@@ -437,7 +437,12 @@ VESPERA_EthernetPort* EthernetPortHelper::getEthernetPortInstance(
     p->DeviceID.set(mac);
     p->PermanentAddress.set(permanent);
     p->NetworkAddresses.set(_one(permanent));
-    p->ElementName.set(_field(info.deviceName));
+
+    if (info.noDeviceName)
+        p->ElementName.clear();
+    else
+        p->ElementName.set(_field(info.deviceName));
+
     p->LinkTechnology.set(2);
     p->Capabilities.set(_one<uint16>(0));
     p->EnabledCapabilities.set(_one<uint16>(0));
@@ -464,10 +469,22 @@ VESPERA_LANEndpoint* EthernetPortHelper::getLANEndpointInstance(
         util->getClassName(ID_VESPERA_ComputerSystem));
     p->SystemName.set(_field(info.hostName));
     p->Name.set(device);
-    p->ElementName.set(device);
-    p->Description.set(device);
-    p->LANID.set(device);
-    p->NameFormat.set(nameFormat);
+
+    if (info.noDeviceName)
+    {
+        p->ElementName.clear();
+        p->Description.clear();
+        p->LANID.clear();
+        p->NameFormat.clear();
+    }
+    else
+    {
+        p->ElementName.set(device);
+        p->Description.set(device);
+        p->LANID.set(device);
+        p->NameFormat.set(nameFormat);
+    }
+
     p->ProtocolIFType.set(1);
     p->MACAddress.set(_field(info.macAddress));
     p->MaxDataSize.set(info.mtu <= UINT_MAX / 8 ? info.mtu * 8 : 0);

@@ -33,6 +33,22 @@ struct _hbaPortInfo
     // The remote port of a target endpoint (plain form). The endpoint's name
     // is longer than portWwn can hold, so the builder composes it from both.
     char rPortWwn[24];
+
+    // PORT_NO_* bits of the members the reply lacked or gave in another
+    // type. The properties that rest on them stay null rather than claim a
+    // zero; a zeroed record lacks nothing.
+    uint32 missing;
+};
+
+enum
+{
+    PORT_NO_NODE_WWN = 1 << 0,
+    PORT_NO_SYMBOLIC_NAME = 1 << 1,
+    PORT_NO_STATE = 1 << 2,
+    PORT_NO_PORT_TYPE = 1 << 3,
+    PORT_NO_FRAME_SIZE = 1 << 4,
+    PORT_NO_SPEED = 1 << 5,
+    PORT_NO_MAX_SPEED = 1 << 6
 };
 
 // Counters of getDynamicPortStatistics for one port. FC ports and FCoE ports
@@ -84,6 +100,9 @@ struct prov_pport_stats_s
 // behalf of TargetHelper for the storage extents, tape drives and logical
 // disks behind them. It also switches a port's beacon.
 //
+// A VESPERA_LogicalPortGroup stands for a node: one instance per node WWN,
+// in the order the walk first meets it, whichever ports and adapters share it.
+//
 // Arrays hold new instances that the caller owns. A port or adapter that
 // can't be read is left out after an ERR line; nothing here throws.
 class PortHelper
@@ -128,6 +147,7 @@ public:
     int setAlarmState(String deviceId, int state);
 
     Instance* getFCPortInstance(_hbaPortInfo port);
+    // The group of the port's node.
     Instance* getLogicalPortGroupInstance(_hbaPortInfo port);
     Instance* getFCPortStatisticsInstance(_hbaPortInfo port,
         prov_pport_stats_s stats, bool isFCoE);

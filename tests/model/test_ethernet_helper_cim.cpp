@@ -170,9 +170,10 @@ TEST_F(EthernetCim, FaultsOfAHostDescription)
       { "hbaData": { "wwn": "20:00:00:05:1e:02:00:00", "hbaMAC": "00:05:1e:02:00:00" },
         "ethPorts": [
           { "mac": "00:05:1e:02:00:01", "ethDev": "eth10" },
-          { "mac": "00:05:1e:02:00:02", "ethDev": "eth11", "ethPortStateMOFValue": 7, "mtu": null,
-            "sfp": { "transceiver": "10G_BASE-SR" } },
-          { "mac": "00:05:1e:02:00:03", "ethDev": ["eth12"], "ethPortStateMOFValue": "11",
+          { "mac": "00:05:1e:02:00:02", "ethDev": "eth11", "ethPortStateMOFValue": 7,
+            "unchecked": { "mtu": null }, "sfp": { "transceiver": "10G_BASE-SR" } },
+          { "mac": "00:05:1e:02:00:03",
+            "unchecked": { "ethDev": ["eth12"], "ethPortStateMOFValue": "11" },
             "sfp": { "transceiver": "10G_BASE-LR" } },
           { "mac": "00:05:1e:02:00:04", "portStatus": false, "mtu": 2000, "ethDev": ")") +
         std::string(3000, 'n') + R"(" } ] },
@@ -191,7 +192,7 @@ TEST_F(EthernetCim, FaultsOfAHostDescription)
     EXPECT_EQ(1u, count(ports.log, "ERR", "00:05:1e:02:00:02 - libGetOpticsSFP got User exception 6: no optics"));
     EXPECT_EQ(1u, count(ports.log, "ERR", "Unable to get SFP info for 00:05:1e:02:00:02"));
     EXPECT_EQ(list({7}), p["00051e020002"]["OperationalStatus"]);
-    EXPECT_EQ("", p["00051e020003"]["ElementName"].asString());
+    EXPECT_TRUE(p["00051e020003"]["ElementName"].isNull());
     EXPECT_EQ(list({0}), p["00051e020003"]["OperationalStatus"]);
     EXPECT_EQ(108, p["00051e020003"]["PortType"].asInt());
     EXPECT_EQ(std::string(1027, 'n'), p["00051e020004"]["ElementName"].asString());
@@ -199,11 +200,15 @@ TEST_F(EthernetCim, FaultsOfAHostDescription)
     EXPECT_EQ(0, p["00051e030001"]["PortNumber"].asInt());
     EXPECT_EQ(105, p["00051e030001"]["PortType"].asInt());
 
-    // The port without a device name has no endpoint: it would have no key.
+    // The port without a device name is an endpoint all the same, named by
+    // the empty name and claiming no device.
     Reply ends = ei("VESPERA_LANEndpoint", host);
     std::map<std::string, Props> e = by(ends, "MACAddress");
-    ASSERT_EQ(3u, e.size()) << ends.log;
-    EXPECT_EQ(1u, count(ends.log, "ERR", "No LAN endpoint for 00:05:1e:02:00:03"));
+    ASSERT_EQ(4u, e.size()) << ends.log;
+    EXPECT_EQ("", e["00051e020003"]["Name"].asString());
+    EXPECT_TRUE(e["00051e020003"]["ElementName"].isNull());
+    EXPECT_TRUE(e["00051e020003"]["NameFormat"].isNull());
+    EXPECT_EQ(1u, count(ends.log, "WARN", "No Ethernet device name for 00051e020003"));
     EXPECT_EQ(0u, e["00051e020002"]["MaxDataSize"].asUInt());
     EXPECT_EQ(0, e["00051e020002"]["HealthState"].asInt());
     EXPECT_EQ(1, e["00051e020002"]["EnabledState"].asInt());
