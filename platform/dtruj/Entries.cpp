@@ -1185,13 +1185,13 @@ JSON_ENTRY(deleteVport)
         std::string vw = e.isString() ? e.asString() : str(e, "vwwn");
         if (!findVport(s, p.place, vw))
             return notFound("virtual port", vw);
-        names.push_back(vw);
+        names.push_back(addrKey(vw));
     }
     Json::Value kept(Json::arrayValue);
-    for (const Json::Value& v : (*p.fc)["vports"]) {
+    for (const Json::Value& v : ro(*p.fc)["vports"]) {
         bool gone = false;
         for (const auto& n : names)
-            gone = gone || sameAddr(n, str(v, "vwwn"));
+            gone = gone || n == addrKey(str(v, "vwwn"));
         if (!gone)
             kept.append(v);
     }

@@ -85,11 +85,6 @@ Json::Value okReply(const std::string& message)
     return r;
 }
 
-bool sameAddr(const std::string& a, const std::string& b)
-{
-    return !a.empty() && strcasecmp(a.c_str(), b.c_str()) == 0;
-}
-
 std::string plainAddr(const std::string& colon)
 {
     std::string out;

@@ -124,7 +124,6 @@ const char* builtinHostText();
 Json::Value errorReply(int code, const std::string& message);
 Json::Value okReply(const std::string& message);
 
-bool sameAddr(const std::string& a, const std::string& b);
 std::string plainAddr(const std::string& colon);
 std::string str(const Json::Value& v, const char* member);
 
