@@ -160,17 +160,10 @@ void EthernetPortHelper::fillFromEthData(const Json::Value& ethData,
     const char* dev = _textMember(ethData, "ethDev");
 
     if (dev)
-    {
         strlcpy(info->deviceName, dev, sizeof(info->deviceName));
-        info->noDeviceName = false;
-    }
     else
-    {
-        info->deviceName[0] = '\0';
-        info->noDeviceName = true;
         TLOG(LL_WARN, "No Ethernet device name for %.*s", macSize,
             info->macAddress);
-    }
 
     // A state goes out as a uint16 of OperationalStatus.
     if (!_uintMember(ethData, "ethPortStateMOFValue", info->state) ||
@@ -437,12 +430,7 @@ VESPERA_EthernetPort* EthernetPortHelper::getEthernetPortInstance(
     p->DeviceID.set(mac);
     p->PermanentAddress.set(permanent);
     p->NetworkAddresses.set(_one(permanent));
-
-    if (info.noDeviceName)
-        p->ElementName.clear();
-    else
-        p->ElementName.set(_field(info.deviceName));
-
+    p->ElementName.set(_field(info.deviceName));
     p->LinkTechnology.set(2);
     p->Capabilities.set(_one<uint16>(0));
     p->EnabledCapabilities.set(_one<uint16>(0));
@@ -469,22 +457,10 @@ VESPERA_LANEndpoint* EthernetPortHelper::getLANEndpointInstance(
         util->getClassName(ID_VESPERA_ComputerSystem));
     p->SystemName.set(_field(info.hostName));
     p->Name.set(device);
-
-    if (info.noDeviceName)
-    {
-        p->ElementName.clear();
-        p->Description.clear();
-        p->LANID.clear();
-        p->NameFormat.clear();
-    }
-    else
-    {
-        p->ElementName.set(device);
-        p->Description.set(device);
-        p->LANID.set(device);
-        p->NameFormat.set(nameFormat);
-    }
-
+    p->ElementName.set(device);
+    p->Description.set(device);
+    p->LANID.set(device);
+    p->NameFormat.set(nameFormat);
     p->ProtocolIFType.set(1);
     p->MACAddress.set(_field(info.macAddress));
     p->MaxDataSize.set(info.mtu <= UINT_MAX / 8 ? info.mtu * 8 : 0);

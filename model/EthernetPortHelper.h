@@ -25,9 +25,6 @@ struct _ethPortInfo
     uint16 portType;              // from the transceiver; 0 if unknown
     uint16 portNumber;            // place in the adapter's list, from 0
     unsigned int mtu;             // "mtu"; 0 if missing
-    // "ethDev" was missing: the port still has its endpoint, under an empty
-    // name, but no property claims a device name.
-    bool noDeviceName;
 };
 
 // Builds VESPERA_EthernetPort and VESPERA_LANEndpoint for the Ethernet ports

@@ -228,16 +228,6 @@ bool hasGroup(const Array<Instance*>& built, const char* nodeWwn)
     return false;
 }
 
-// A property that rests on a member the reply lacked stays null.
-template<class T, class V>
-void setIfKnown(Property<T>& property, const _hbaPortInfo& port, uint32 bit, const V& value)
-{
-    if (port.missing & bit)
-        property.clear();
-    else
-        property.set(value);
-}
-
 struct Stat_Id
 {
     int id;
@@ -308,47 +298,36 @@ void PortHelper::fillPortInfo(const Json::Value& reply, const String& index,
 
     copyPlainAddress(port.portWwn, sizeof(port.portWwn), wwn, "wwn");
 
+    // A member that is missing, or of another type, leaves its field at the
+    // record's zero, as the builders expect.
     const char* node = textOf(reply, "nodeWwn");
 
-    if (node && *node)
+    if (node)
         copyPlainAddress(port.nodeWwn, sizeof(port.nodeWwn), node, "nodeWwn");
-    else
-        port.missing |= PORT_NO_NODE_WWN;
 
     const char* symbolicName = textOf(reply, "PortSymbolicName");
 
     if (symbolicName)
         copyField(port.symbolicName, sizeof(port.symbolicName), symbolicName,
             "PortSymbolicName");
-    else
-        port.missing |= PORT_NO_SYMBOLIC_NAME;
 
     const Json::Value& state = member(reply, "portStatusValue");
 
     if (state.isInt())
         port.state = state.asInt();
-    else
-        port.missing |= PORT_NO_STATE;
 
     const Json::Value& type = member(reply, "portTypeMOFValue");
 
     if (type.isUInt() && type.asUInt() <= 0xFFFF)
         port.portType = (uint16)type.asUInt();
-    else
-        port.missing |= PORT_NO_PORT_TYPE;
 
     const Json::Value& frame = member(reply, "maxFrameSize");
 
     if (frame.isUInt64())
         port.maxFrameSize = frame.asUInt64();
-    else
-        port.missing |= PORT_NO_FRAME_SIZE;
 
-    if (!operatingSpeed(member(reply, "operatingSpeed"), port.speed))
-        port.missing |= PORT_NO_SPEED;
-
-    if (!maximumSpeed(member(reply, "supportedPortSpeeds"), port.maxSpeed))
-        port.missing |= PORT_NO_MAX_SPEED;
+    operatingSpeed(member(reply, "operatingSpeed"), port.speed);
+    maximumSpeed(member(reply, "supportedPortSpeeds"), port.maxSpeed);
 
     port.portNumber = portNumber;
 }
@@ -598,7 +577,9 @@ void PortHelper::_buildForPort(const String& portIndex, const Json::Value& reply
             break;
 
         case ID_VESPERA_LogicalPortGroup:
-            if (port.missing & PORT_NO_NODE_WWN)
+            // A port that names no node belongs to no group: an empty key
+            // would stand for no node at all.
+            if (port.nodeWwn[0] == '\0')
                 TLOG(LL_WARN, "No logical port group for %s: its node WWN is unknown",
                     port.portWwn);
             else if (!hasGroup(result, port.nodeWwn))
@@ -692,17 +673,7 @@ void PortHelper::_addTargetEndpoints(const _hbaPortInfo& port, Array<Instance*>&
         copyPlainAddress(target.rPortWwn, sizeof(target.rPortWwn), remoteWwn,
             "remotePortWwn");
         const Json::Value& state = member(device, "stateMofValue");
-
-        if (state.isInt())
-        {
-            target.state = state.asInt();
-            target.missing &= ~PORT_NO_STATE;
-        }
-        else
-        {
-            target.state = 0;
-            target.missing |= PORT_NO_STATE;
-        }
+        target.state = state.isInt() ? state.asInt() : 0;
 
         result.append(getSCSIProtocolEndpointInstance(target, false));
     }
@@ -907,19 +878,19 @@ Instance* PortHelper::getFCPortInstance(_hbaPortInfo port)
     p->PermanentAddress.set(port.portWwn);
 
     String name(port.nodeWwn, ":", port.portWwn);
-    setIfKnown(p->ElementName, port, PORT_NO_NODE_WWN, name);
-    setIfKnown(p->Name, port, PORT_NO_NODE_WWN, name);
-    setIfKnown(p->Caption, port, PORT_NO_SYMBOLIC_NAME, port.symbolicName);
-    setIfKnown(p->OperationalStatus, port, PORT_NO_STATE, oneElement((uint16)port.state));
-    setIfKnown(p->EnabledState, port, PORT_NO_STATE, getEnabledState(port.state));
+    p->ElementName.set(name);
+    p->Name.set(name);
+
+    p->Caption.set(port.symbolicName);
+    p->OperationalStatus.set(oneElement((uint16)port.state));
     p->UsageRestriction.set(3);
-    setIfKnown(p->PortType, port, PORT_NO_PORT_TYPE, port.portType);
-    setIfKnown(p->Speed, port, PORT_NO_SPEED, port.speed);
-    setIfKnown(p->MaxSpeed, port, PORT_NO_MAX_SPEED, port.maxSpeed);
+    p->PortType.set(port.portType);
+    p->Speed.set(port.speed);
+    p->MaxSpeed.set(port.maxSpeed);
     p->LinkTechnology.set(4);
-    setIfKnown(p->SupportedMaximumTransmissionUnit, port, PORT_NO_FRAME_SIZE,
-        port.maxFrameSize);
+    p->SupportedMaximumTransmissionUnit.set(port.maxFrameSize);
     p->PortNumber.set(port.portNumber);
+    p->EnabledState.set(getEnabledState(port.state));
     p->EnabledDefault.set(2);
 
     return p;
@@ -1009,12 +980,12 @@ Instance* PortHelper::getSCSIProtocolEndpointInstance(_hbaPortInfo port, bool is
     p->SystemName.set(port.hostName);
     p->Name.set(name);
     p->ElementName.set(name);
-    setIfKnown(p->OperationalStatus, port, PORT_NO_STATE, oneElement((uint16)port.state));
-    setIfKnown(p->EnabledState, port, PORT_NO_STATE, getEnabledState(port.state));
+    p->OperationalStatus.set(oneElement((uint16)port.state));
     p->ProtocolIFType.set(1);
     p->OtherTypeDescription.set("SCSI");
     p->ConnectionType.set(2);
     p->Role.set(isInitiator ? 2 : 3);
+    p->EnabledState.set(getEnabledState(port.state));
 
     return p;
 }
@@ -1029,7 +1000,7 @@ Instance* PortHelper::getAlarmDeviceInstance(_hbaPortInfo port, bool beaconOn)
     p->Description.set(port.hostName);
     p->DeviceID.set(port.portWwn);
     p->ElementName.set(port.portWwn);
-    setIfKnown(p->Caption, port, PORT_NO_SYMBOLIC_NAME, port.symbolicName);
+    p->Caption.set(port.symbolicName);
     p->VisibleAlarm.set(true);
     p->Urgency.set(3);
     p->AlarmState.set(beaconOn ? 3 : 1);

@@ -33,22 +33,6 @@ struct _hbaPortInfo
     // The remote port of a target endpoint (plain form). The endpoint's name
     // is longer than portWwn can hold, so the builder composes it from both.
     char rPortWwn[24];
-
-    // PORT_NO_* bits of the members the reply lacked or gave in another
-    // type. The properties that rest on them stay null rather than claim a
-    // zero; a zeroed record lacks nothing.
-    uint32 missing;
-};
-
-enum
-{
-    PORT_NO_NODE_WWN = 1 << 0,
-    PORT_NO_SYMBOLIC_NAME = 1 << 1,
-    PORT_NO_STATE = 1 << 2,
-    PORT_NO_PORT_TYPE = 1 << 3,
-    PORT_NO_FRAME_SIZE = 1 << 4,
-    PORT_NO_SPEED = 1 << 5,
-    PORT_NO_MAX_SPEED = 1 << 6
 };
 
 // Counters of getDynamicPortStatistics for one port. FC ports and FCoE ports

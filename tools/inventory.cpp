@@ -122,13 +122,6 @@ std::string speedText(uint64_t bits)
     return s.str();
 }
 
-// A speed the port didn't report is unknown, not "no link".
-std::string speedOf(const ch::Instance& i, const char* property)
-{
-    const ch::Value* v = i.get(property);
-    return v && !v->null ? speedText(number(i, property)) : "unknown";
-}
-
 std::string enabledText(uint64_t state)
 {
     switch (state)
@@ -373,7 +366,7 @@ int main(int argc, char** argv)
 
         printf("  FC port %s  %s, %s (max %s), %s, %s\n",
             text(i, "PortNumber").c_str(), colon(p.wwn).c_str(),
-            speedOf(i, "Speed").c_str(), speedOf(i, "MaxSpeed").c_str(),
+            speedText(number(i, "Speed")).c_str(), speedText(number(i, "MaxSpeed")).c_str(),
             enabledText(number(i, "EnabledState")).c_str(), beacon.c_str());
 
         std::string suffix = "_" + std::to_string(adapterNo) + "_" + text(i, "PortNumber");

@@ -192,7 +192,7 @@ TEST_F(EthernetCim, FaultsOfAHostDescription)
     EXPECT_EQ(1u, count(ports.log, "ERR", "00:05:1e:02:00:02 - libGetOpticsSFP got User exception 6: no optics"));
     EXPECT_EQ(1u, count(ports.log, "ERR", "Unable to get SFP info for 00:05:1e:02:00:02"));
     EXPECT_EQ(list({7}), p["00051e020002"]["OperationalStatus"]);
-    EXPECT_TRUE(p["00051e020003"]["ElementName"].isNull());
+    EXPECT_EQ("", p["00051e020003"]["ElementName"].asString());
     EXPECT_EQ(list({0}), p["00051e020003"]["OperationalStatus"]);
     EXPECT_EQ(108, p["00051e020003"]["PortType"].asInt());
     EXPECT_EQ(std::string(1027, 'n'), p["00051e020004"]["ElementName"].asString());
@@ -201,13 +201,12 @@ TEST_F(EthernetCim, FaultsOfAHostDescription)
     EXPECT_EQ(105, p["00051e030001"]["PortType"].asInt());
 
     // The port without a device name is an endpoint all the same, named by
-    // the empty name and claiming no device.
+    // the empty name.
     Reply ends = ei("VESPERA_LANEndpoint", host);
     std::map<std::string, Props> e = by(ends, "MACAddress");
     ASSERT_EQ(4u, e.size()) << ends.log;
     EXPECT_EQ("", e["00051e020003"]["Name"].asString());
-    EXPECT_TRUE(e["00051e020003"]["ElementName"].isNull());
-    EXPECT_TRUE(e["00051e020003"]["NameFormat"].isNull());
+    EXPECT_EQ("", e["00051e020003"]["ElementName"].asString());
     EXPECT_EQ(1u, count(ends.log, "WARN", "No Ethernet device name for 00051e020003"));
     EXPECT_EQ(0u, e["00051e020002"]["MaxDataSize"].asUInt());
     EXPECT_EQ(0, e["00051e020002"]["HealthState"].asInt());

@@ -269,7 +269,7 @@ TEST_F(PortHelperTest, AFailureAtOneElementLeavesTheOthers)
     EXPECT_EQ(1u, log.count("WARN", "No adapters in the system. "));
 }
 
-TEST_F(PortHelperTest, OddRepliesGiveNullsAndCutTextsNeverMore)
+TEST_F(PortHelperTest, OddRepliesGiveZerosAndCutTextsNeverMore)
 {
     Json::Value odd = parse(R"({"wwn": "10:00:00:00:c9:aa:00:01", "nodeWwn": ["x"],
         "PortSymbolicName": 42, "operatingSpeed": "8", "supportedPortSpeeds": "16",
@@ -289,18 +289,17 @@ TEST_F(PortHelperTest, OddRepliesGiveNullsAndCutTextsNeverMore)
     Walk w(helper()->getInstancesByClass(ID_VESPERA_FCPort));
     ASSERT_EQ(3u, w.size());
 
-    // A member of the wrong type, or a number no property can hold, is no
-    // value: its properties are null rather than zero.
     VESPERA_FCPort* a = w.at<VESPERA_FCPort>(0);
-    EXPECT_EQ(LEFT, str(a->DeviceID.value));
-    EXPECT_TRUE(a->Name.null && a->ElementName.null && a->Caption.null);
-    EXPECT_TRUE(a->Speed.null && a->MaxSpeed.null && a->SupportedMaximumTransmissionUnit.null);
-    EXPECT_TRUE(a->PortType.null && a->OperationalStatus.null && a->EnabledState.null);
+    EXPECT_EQ(":" + std::string(LEFT), str(a->Name.value));
+    EXPECT_EQ("", str(a->Caption.value));
+    EXPECT_EQ(0u, a->Speed.value + a->MaxSpeed.value + a->SupportedMaximumTransmissionUnit.value);
+    EXPECT_EQ(0, a->PortType.value);
+    EXPECT_EQ(1, a->EnabledState.value);
 
     VESPERA_FCPort* b = w.at<VESPERA_FCPort>(1);
     EXPECT_EQ(1027u, str(b->Caption.value).size());
     EXPECT_EQ(std::string(23, 'a') + ":" + RIGHT, str(b->Name.value));
-    EXPECT_TRUE(b->Speed.null && b->MaxSpeed.null);
+    EXPECT_EQ(0u, b->Speed.value + b->MaxSpeed.value);
     EXPECT_EQ(1u, log.count("WARN", "PortSymbolicName is longer than 1027 characters"));
 
     // A reply that doesn't name its port is named by what it was asked for.

@@ -104,20 +104,4 @@ TEST_F(Inventory, AMezzanineCardAndAHostWithoutAdapters)
     EXPECT_EQ(0u, countLines(out, {"Adapter "}));
 }
 
-// A speed the port didn't report is unknown, where no speed at all is no link.
-TEST_F(Inventory, ASpeedThatWasntReported)
-{
-    std::string host = workDir() + "/speeds.json";
-    writeFile(host, R"({ "adapters": [ { "hbaData": { "wwn": "20:00:00:00:c9:aa:00:00" },
-        "driver": { "storageDriverName": "vsprfc" },
-        "fcPorts": [ { "wwn": "10:00:00:00:c9:aa:00:01" },
-                     { "wwn": "10:00:00:00:c9:aa:00:02", "operatingSpeed": 8,
-                       "supportedPortSpeeds": [16], "linkUp": false } ] } ] })");
-    int status = -1;
-    std::string out = inventory(host, status);
-    ASSERT_EQ(0, status) << out;
-    EXPECT_EQ(1u, countLines(out, {"  FC port 0", "unknown (max unknown)"})) << out;
-    EXPECT_EQ(1u, countLines(out, {"  FC port 1", "no link (max 16 Gbit/s)"})) << out;
-}
-
 #endif
