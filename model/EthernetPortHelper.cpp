@@ -331,15 +331,8 @@ Array<Instance*> EthernetPortHelper::getInstancesByAdapterId(int adapterId,
         }
         else if (id == ID_VESPERA_LANEndpoint)
         {
-            // The device name is the endpoint's key: without one, two such
-            // ports would be the same endpoint to a client.
-            if (info.deviceName[0] == '\0')
-            {
-                TLOG(LL_ERR, "No LAN endpoint for %s without a device name",
-                    portIndex);
-                continue;
-            }
-
+            // A port without a device name still is an endpoint; its key
+            // is then the empty name.
             result.append(getLANEndpointInstance(info));
         }
         else

@@ -70,31 +70,38 @@ bool boolOf(const Json::Value& object, const char* name, bool& out)
     return true;
 }
 
-int intOf(const Json::Value& object, const char* name)
-{
-    const Json::Value& v = member(object, name);
-    return v.isInt() ? v.asInt() : 0;
-}
-
-uint64 uint64Of(const Json::Value& object, const char* name)
-{
-    const Json::Value& v = member(object, name);
-    return v.isUInt64() ? v.asUInt64() : 0;
-}
-
-// Gbit/s to bit/s; no speed, a negative one or one that can't be held in
-// bit/s reads as 0.
-uint64 bitsPerSecond(const Json::Value& v)
+// Gbit/s in bit/s, if a member holds a count of Gbit/s that bit/s can hold.
+bool gigabitsToBits(const Json::Value& v, uint64& bits)
 {
     if (!v.isInt64())
-        return 0;
+        return false;
 
     sint64 gbps = v.asInt64();
 
-    if (gbps == NO_SPEED || gbps <= 0 || (uint64)gbps > UINT64_MAX / GIGA)
-        return 0;
+    if (gbps < 0 || (uint64)gbps > UINT64_MAX / GIGA)
+        return false;
 
-    return (uint64)gbps * GIGA;
+    bits = (uint64)gbps * GIGA;
+    return true;
+}
+
+// The current speed: a link without one says 99999, which reads as 0.
+bool operatingSpeed(const Json::Value& v, uint64& bits)
+{
+    if (v.isInt64() && v.asInt64() == NO_SPEED)
+    {
+        bits = 0;
+        return true;
+    }
+
+    return gigabitsToBits(v, bits);
+}
+
+// The first supported speed is the port's maximum, taken as it stands: 99999
+// means "no value" only for a link's current speed.
+bool maximumSpeed(const Json::Value& speeds, uint64& bits)
+{
+    return speeds.isArray() && speeds.size() > 0 && gigabitsToBits(speeds[0u], bits);
 }
 
 // Copies a text into a record field, cut to fit; the cut is logged since it
@@ -205,6 +212,22 @@ bool walkServes(classId_t id, bool byAddress)
     }
 }
 
+// The group of a node, if the walk built it already. Nodes are one whatever
+// the case their ports spell the WWN in.
+bool hasGroup(const Array<Instance*>& built, const char* nodeWwn)
+{
+    for (size_t i = 0; i < built.size(); i++)
+    {
+        const VESPERA_LogicalPortGroup* g =
+            checked_cast<VESPERA_LogicalPortGroup>(static_cast<const Instance*>(built[i]));
+
+        if (g && !g->InstanceID.null && g->InstanceID.value.equali(nodeWwn))
+            return true;
+    }
+
+    return false;
+}
+
 struct Stat_Id
 {
     int id;
@@ -274,20 +297,37 @@ void PortHelper::fillPortInfo(const Json::Value& reply, const String& index,
     }
 
     copyPlainAddress(port.portWwn, sizeof(port.portWwn), wwn, "wwn");
-    copyPlainAddress(port.nodeWwn, sizeof(port.nodeWwn), textOf(reply, "nodeWwn"),
-        "nodeWwn");
-    copyField(port.symbolicName, sizeof(port.symbolicName),
-        textOf(reply, "PortSymbolicName"), "PortSymbolicName");
 
-    port.state = intOf(reply, "portStatusValue");
-    port.portType = (uint16)intOf(reply, "portTypeMOFValue");
-    port.maxFrameSize = uint64Of(reply, "maxFrameSize");
-    port.speed = bitsPerSecond(member(reply, "operatingSpeed"));
+    // A member that is missing, or of another type, leaves its field at the
+    // record's zero, as the builders expect.
+    const char* node = textOf(reply, "nodeWwn");
 
-    const Json::Value& speeds = member(reply, "supportedPortSpeeds");
+    if (node)
+        copyPlainAddress(port.nodeWwn, sizeof(port.nodeWwn), node, "nodeWwn");
 
-    if (speeds.isArray() && speeds.size() > 0)
-        port.maxSpeed = bitsPerSecond(speeds[0u]);
+    const char* symbolicName = textOf(reply, "PortSymbolicName");
+
+    if (symbolicName)
+        copyField(port.symbolicName, sizeof(port.symbolicName), symbolicName,
+            "PortSymbolicName");
+
+    const Json::Value& state = member(reply, "portStatusValue");
+
+    if (state.isInt())
+        port.state = state.asInt();
+
+    const Json::Value& type = member(reply, "portTypeMOFValue");
+
+    if (type.isUInt() && type.asUInt() <= 0xFFFF)
+        port.portType = (uint16)type.asUInt();
+
+    const Json::Value& frame = member(reply, "maxFrameSize");
+
+    if (frame.isUInt64())
+        port.maxFrameSize = frame.asUInt64();
+
+    operatingSpeed(member(reply, "operatingSpeed"), port.speed);
+    maximumSpeed(member(reply, "supportedPortSpeeds"), port.maxSpeed);
 
     port.portNumber = portNumber;
 }
@@ -373,7 +413,27 @@ Array<Instance*> PortHelper::getInstancesByClass(classId_t id)
     }
 
     for (int adapterId = 1; adapterId <= count; adapterId++)
-        result.append(getInstancesByAdapterId(adapterId, id, adapters));
+    {
+        Array<Instance*> more = getInstancesByAdapterId(adapterId, id, adapters);
+
+        if (id != ID_VESPERA_LogicalPortGroup)
+        {
+            result.append(more);
+            continue;
+        }
+
+        // A node whose ports lie on several adapters stays one group.
+        for (size_t i = 0; i < more.size(); i++)
+        {
+            const VESPERA_LogicalPortGroup* g =
+                checked_cast<VESPERA_LogicalPortGroup>(static_cast<const Instance*>(more[i]));
+
+            if (g && hasGroup(result, g->InstanceID.value.c_str()))
+                destroyer(more[i]);
+            else
+                result.append(more[i]);
+        }
+    }
 
     return result;
 }
@@ -517,7 +577,13 @@ void PortHelper::_buildForPort(const String& portIndex, const Json::Value& reply
             break;
 
         case ID_VESPERA_LogicalPortGroup:
-            result.append(getLogicalPortGroupInstance(port));
+            // A port that names no node belongs to no group: an empty key
+            // would stand for no node at all.
+            if (port.nodeWwn[0] == '\0')
+                TLOG(LL_WARN, "No logical port group for %s: its node WWN is unknown",
+                    port.portWwn);
+            else if (!hasGroup(result, port.nodeWwn))
+                result.append(getLogicalPortGroupInstance(port));
             break;
 
         case ID_VESPERA_AlarmDevice:
@@ -606,7 +672,9 @@ void PortHelper::_addTargetEndpoints(const _hbaPortInfo& port, Array<Instance*>&
         _hbaPortInfo target = port;
         copyPlainAddress(target.rPortWwn, sizeof(target.rPortWwn), remoteWwn,
             "remotePortWwn");
-        target.state = intOf(device, "stateMofValue");
+        const Json::Value& state = member(device, "stateMofValue");
+        target.state = state.isInt() ? state.asInt() : 0;
+
         result.append(getSCSIProtocolEndpointInstance(target, false));
     }
 }
@@ -832,10 +900,11 @@ Instance* PortHelper::getLogicalPortGroupInstance(_hbaPortInfo port)
 {
     VESPERA_LogicalPortGroup* p = create<VESPERA_LogicalPortGroup>(true);
 
+    // The group is the node: its ports are its members, not its name.
     p->InstanceID.set(port.nodeWwn);
-    p->Name.set(port.portWwn);
+    p->Name.set(port.nodeWwn);
     p->NameFormat.set("WWN");
-    p->ElementName.set(String(port.nodeWwn, ":", port.portWwn));
+    p->ElementName.set(port.nodeWwn);
     p->Caption.set(port.hostName);
     p->Description.set(port.hostName);
 

@@ -84,6 +84,9 @@ struct prov_pport_stats_s
 // behalf of TargetHelper for the storage extents, tape drives and logical
 // disks behind them. It also switches a port's beacon.
 //
+// A VESPERA_LogicalPortGroup stands for a node: one instance per node WWN,
+// in the order the walk first meets it, whichever ports and adapters share it.
+//
 // Arrays hold new instances that the caller owns. A port or adapter that
 // can't be read is left out after an ERR line; nothing here throws.
 class PortHelper
@@ -128,6 +131,7 @@ public:
     int setAlarmState(String deviceId, int state);
 
     Instance* getFCPortInstance(_hbaPortInfo port);
+    // The group of the port's node.
     Instance* getLogicalPortGroupInstance(_hbaPortInfo port);
     Instance* getFCPortStatisticsInstance(_hbaPortInfo port,
         prov_pport_stats_s stats, bool isFCoE);

@@ -157,6 +157,8 @@ public:
 
     void assign(const T* data, size_t size) { __assign(_rep, data, size); }
     void reserve(size_t capacity) { __reserve(_rep, capacity); }
+    // Grown elements are copies of value for a type with a construct (String,
+    // Datetime, classes); for plain types they are zeroed and value is unused.
     void resize(size_t size, const T& value = T()) { __resize(_rep, size, &value); }
     void clear() { __remove(_rep, 0, _rep->size); }
 

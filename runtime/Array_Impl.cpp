@@ -189,6 +189,16 @@ void __resize(__Array_Rep*& rep, size_t size, const void* value)
     if (size == rep->size)
         return;
 
+    // Plain elements of a grown array start as zero bytes, as those of a
+    // fresh record do; value only ever feeds a construct.
+    if (!traits->construct)
+    {
+        __reserve(rep, size);
+        memset(rep->data() + rep->size * esize, 0, (size - rep->size) * esize);
+        rep->size = size;
+        return;
+    }
+
     // value may be one of our own elements, which growing would move.
     __Array_Rep* tmp = 0;
 
@@ -204,10 +214,8 @@ void __resize(__Array_Rep*& rep, size_t size, const void* value)
     {
         char* at = rep->data() + i * esize;
 
-        if (traits->construct && value)
+        if (value)
             traits->construct(at, value);
-        else if (value)
-            memcpy(at, value, esize);
         else
             memset(at, 0, esize);
     }

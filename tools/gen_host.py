@@ -35,6 +35,7 @@ def adapter(i, args):
         "oemSerialNum": "",
         "uuid": "",
         "hbaStatus": True,
+        "isMezz": False,
         "pciLocation": "0000:%02x:00.0" % (i % 256),
     }
     if cna:
@@ -46,12 +47,16 @@ def adapter(i, args):
     for j in range(args.ports):
         port = {
             "wwn": addr(0x10, 0, 0, 0x05, 0x1E, hi, lo, j + 1),
+            "PortSymbolicName": "%s port%d" % ("Vespera-1860" if cna else "Vespera-1020", j),
             "operatingSpeed": 10 if cna else 16,
             "supportedPortSpeeds": [10] if cna else [16, 8, 4],
+            "portTypeMOFValue": 10,
+            "maxFrameSize": 2112,
+            "isFCoE": cna,
+            "beaconState": False,
             "remotePorts": [remote(i, j, k, args) for k in range(args.rports)],
         }
         if cna:
-            port["isFCoE"] = True
             port["fcoeMac"] = addr(0x00, 0x05, 0x1E, hi, lo, 0x80 + j)
         else:
             port["sfp"] = {"vendorName": "VSPR OPTICS", "serialNo": "SFG%05d%02d" % (i, j),

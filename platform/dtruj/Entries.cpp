@@ -102,10 +102,11 @@ bool sameType(const Json::Value& a, const Json::Value& b)
     return a.type() == b.type();
 }
 
-// Applies the members named in `names` from `src` to `target`, all or none.
-// Identity members can't be changed, and a value must keep its type.
-bool applyProps(Json::Value& target, const Json::Value& src, const Json::Value& names,
-                std::vector<std::string>& changed, std::string& err)
+// Applies the members named in `names` from `src` to `target`, a `part` of
+// the host (see checkMemberType), all or none. Identity members can't be
+// changed, and a value must keep its type, also where the host had none yet.
+bool applyProps(Json::Value& target, const char* part, const Json::Value& src,
+                const Json::Value& names, std::vector<std::string>& changed, std::string& err)
 {
     static const char* const readOnly[] = {"wwn", "mac", "nodeWwn", "hbaMAC", "fcoeMac",
                                            "remotePorts", "vports", "vnics", nullptr};
@@ -132,7 +133,9 @@ bool applyProps(Json::Value& target, const Json::Value& src, const Json::Value& 
             err = "property " + name + " has no value";
             return false;
         }
-        if (target.isMember(name) && !sameType(target[name], src[name])) {
+        std::string why;
+        if ((target.isMember(name) && !sameType(target[name], src[name]))
+            || !checkMemberType(part, name, src[name], why)) {
             err = "property " + name + " has the wrong type";
             return false;
         }
@@ -168,6 +171,7 @@ struct PortRef {
     Json::Value* adapter = nullptr;
     Json::Value* fc = nullptr;
     Json::Value* eth = nullptr;
+    PortPlace place;
     std::string addr;
 };
 
@@ -177,10 +181,24 @@ PortRef findPort(State& s, const std::string& addr)
     r.addr = addr;
     if (addr.empty())
         return r;
-    r.fc = findFcPort(s, addr, &r.adapter);
+    r.fc = findFcPort(s, addr, &r.adapter, &r.place);
     if (!r.fc)
-        r.eth = findEthPort(s, addr, &r.adapter);
+        r.eth = findEthPort(s, addr, &r.adapter, &r.place);
     return r;
+}
+
+// Reads a part of the host without adding the members it lacks, as the
+// non-const operator[] of JsonCpp would.
+const Json::Value& ro(const Json::Value& v)
+{
+    return v;
+}
+
+// Copies a member into a reply if the part has it.
+void copyIfAny(Json::Value& reply, const char* name, const Json::Value& part, const char* from = nullptr)
+{
+    if (part.isObject() && part.isMember(from ? from : name))
+        reply[name] = part[from ? from : name];
 }
 
 // ---------------------------------------------------------------- statistics
@@ -292,7 +310,7 @@ std::string scopeKey(const Json::Value& req)
 // The configuration of a test, the host's default overlaid by the port's own.
 Json::Value testConfig(State& s, const char* test, const Json::Value* port)
 {
-    Json::Value c = s.host["diagnostics"][test];
+    Json::Value c = ro(s.host)["diagnostics"][test];
     if (port && (*port)["diag"].isObject() && (*port)["diag"][test].isObject())
         for (const std::string& m : (*port)["diag"][test].getMemberNames())
             c[m] = (*port)["diag"][test][m];
@@ -310,7 +328,7 @@ Json::Value runResults(State& s, const std::string& id, DiagRun& run)
     bool stopped = false;
     bool running = false;
     for (const Json::Value& test : run.tests) {
-        Json::Value cfg = s.host["diagnostics"]["posted"][test["function"].asString()];
+        Json::Value cfg = ro(s.host)["diagnostics"]["posted"][test["function"].asString()];
         double dur = cfg.get("durationMs", 100).asDouble() / 1000.0;
         Json::Value e(Json::objectValue);
         e["function"] = test["function"];
@@ -363,7 +381,7 @@ std::string nextVersion(const std::string& v)
 {
     size_t pos = v.find_last_of("0123456789");
     if (pos == std::string::npos)
-        return v + ".1";
+        return v.empty() ? "1" : v + ".1";
     size_t start = pos;
     while (start > 0 && isdigit((unsigned char)v[start - 1]))
         --start;
@@ -384,18 +402,6 @@ std::string colonMacPlus(const std::string& mac, int add)
     snprintf(buf, sizeof(buf), "%02lx:%02lx:%02lx:%02lx:%02lx:%02lx", (v >> 40) & 0xff,
              (v >> 32) & 0xff, (v >> 24) & 0xff, (v >> 16) & 0xff, (v >> 8) & 0xff, v & 0xff);
     return buf;
-}
-
-bool wwnTaken(State& s, const std::string& w)
-{
-    for (Json::Value& a : s.host["adapters"])
-        for (Json::Value& p : a["fcPorts"]) {
-            if (sameAddr(w, str(p, "wwn")))
-                return true;
-            if (findVport(p, w))
-                return true;
-        }
-    return false;
 }
 
 } // namespace
@@ -559,7 +565,7 @@ JSON_ENTRY(getGlobalInfo)
     Json::Value& ads = s.host["adapters"];
     r["numOfAdapters"] = Json::UInt(ads.size());
     r["adapter"] = Json::Value(Json::arrayValue);
-    for (Json::Value& a : ads) {
+    for (const Json::Value& a : ro(ads)) {
         Json::Value e(Json::objectValue);
         bool cna = adapterIsCNA(a);
         bool fcoe = false;
@@ -570,8 +576,8 @@ JSON_ENTRY(getGlobalInfo)
         e["fcoe"] = fcoe;
         e["ethPort"] = !a["ethPorts"].empty();
         e["mac"] = a["hbaData"].get("hbaMAC", "");
-        e["wwn"] = a["hbaData"]["wwn"];
-        e["model"] = a["hbaData"]["model"];
+        copyIfAny(e, "wwn", a["hbaData"]);
+        copyIfAny(e, "model", a["hbaData"]);
         Json::Value hasFc(Json::arrayValue), hasEth(Json::arrayValue), hasFcoe(Json::arrayValue);
         Json::Value pw(Json::arrayValue), pm(Json::arrayValue), fm(Json::arrayValue);
         for (const Json::Value& p : a["fcPorts"]) {
@@ -639,13 +645,7 @@ JSON_ENTRY(getAdapterIdByPort)
     std::string addr = firstOf(req, {"indexStr", "wwn", "mac"});
     PortRef p = findPort(s, addr);
     Json::Value r(Json::objectValue);
-    r["adapterId"] = 0;     // 0: no adapter has this port
-    if (p.adapter) {
-        Json::Value& ads = s.host["adapters"];
-        for (Json::ArrayIndex i = 0; i < ads.size(); ++i)
-            if (&ads[i] == p.adapter)
-                r["adapterId"] = int(i) + 1;
-    }
+    r["adapterId"] = p.adapter ? int(p.place.adapter) + 1 : 0;     // 0: no adapter has this port
     return r;
 }
 
@@ -714,11 +714,12 @@ JSON_ENTRY(getAdvAdapterData)
     Json::Value* a = findAdapter(s, addr);
     if (!a)
         return notFound("adapter", addr);
-    Json::Value r = (*a)["advData"];
-    r["indexStr"] = adapterIndex(*a);
-    r["mode"] = (*a)["hbaData"]["mode"];
-    r["alias"] = (*a)["hbaData"]["alias"];
-    r["numPciFunctions"] = Json::UInt((*a)["fcPorts"].size());
+    const Json::Value& ad = *a;
+    Json::Value r = ad["advData"];
+    r["indexStr"] = adapterIndex(ad);
+    r["mode"] = ad["hbaData"]["mode"];
+    copyIfAny(r, "alias", ad["hbaData"]);
+    r["numPciFunctions"] = Json::UInt(ad["fcPorts"].size());
     return r;
 }
 
@@ -784,8 +785,8 @@ JSON_ENTRY(getFlashInfo)
     Json::Value r = (*a)["flash"];
     r.removeMember("updateStatus");
     r.removeMember("updateMessage");
-    r["firmwareVersion"] = (*a)["firmware"]["version"];
-    r["biosVersion"] = (*a)["firmware"]["biosVersion"];
+    copyIfAny(r, "firmwareVersion", ro(*a)["firmware"], "version");
+    copyIfAny(r, "biosVersion", ro(*a)["firmware"]);
     return r;
 }
 
@@ -804,7 +805,7 @@ JSON_ENTRY(adapterUpdateFlash)
         s.updateLog.push_back(adapterIndex(*a) + ": " + r["message"].asString());
         return r;
     }
-    Json::Value& fl = (*a)["flash"];
+    const Json::Value& fl = ro(*a)["flash"];
     if (fl.isMember("updateStatus") && fl["updateStatus"].asInt() != 0) {
         r["status"] = fl["updateStatus"].asInt();
         r["message"] = fl.get("updateMessage", "Flash write failed").asString();
@@ -823,7 +824,7 @@ JSON_ENTRY(adapterUpdateFlash)
             break;
         }
     if (version.empty())
-        version = nextVersion((*a)["firmware"]["version"].asString());
+        version = nextVersion(str(ro(*a)["firmware"], "version"));
     (*a)["firmware"]["version"] = version;
     r["status"] = 0;
     r["message"] = "Flash updated to firmware version " + version;
@@ -861,13 +862,14 @@ JSON_ENTRY(setPortByWwn)
     if (!port)
         return notFound("port", p.addr);
     const Json::Value& names = req["propArray"];
+    const Json::Value& mezz = ro(*port).isMember("isMezz") ? ro(*port)["isMezz"] : ro(*p.adapter)["hbaData"]["isMezz"];
     if (p.fc && names.isArray())
         for (const Json::Value& n : names)
-            if (n.isString() && n.asString() == "beaconState" && (*p.adapter)["hbaData"]["isMezz"].asBool())
+            if (n.isString() && n.asString() == "beaconState" && mezz.asBool())
                 return errorReply(4, "Beacon is not supported on a mezzanine card");
     std::vector<std::string> changed;
     std::string err;
-    if (!applyProps(*port, req["port"], names, changed, err))
+    if (!applyProps(*port, p.fc ? "fcPort" : "ethPort", req["port"], names, changed, err))
         return errorReply(3, err);
     if (contains(changed, "portStatus")) {
         bool on = (*port)["portStatus"].asBool();
@@ -887,10 +889,11 @@ JSON_ENTRY(getFcByFcWwn)
     PortRef p = findPort(s, firstOf(req, {"wwn", "portWwn", "indexStr"}));
     if (!p.fc)
         return notFound("FC port", p.addr);
-    Json::Value r = (*p.fc)["fcData"];
-    r["portWwn"] = (*p.fc)["wwn"];
-    r["nodeWwn"] = (*p.fc)["nodeWwn"];
-    r["isFCoE"] = (*p.fc)["isFCoE"];
+    const Json::Value& port = *p.fc;
+    Json::Value r = port["fcData"];
+    r["portWwn"] = port["wwn"];
+    copyIfAny(r, "nodeWwn", port);
+    copyIfAny(r, "isFCoE", port);
     return r;
 }
 
@@ -901,7 +904,7 @@ JSON_ENTRY(setFcByFcWwn)
         return notFound("FC port", p.addr);
     std::vector<std::string> changed;
     std::string err;
-    if (!applyProps((*p.fc)["fcData"], req["fcPortData"], req["paramsConfigured"], changed, err))
+    if (!applyProps((*p.fc)["fcData"], "fcData", req["fcPortData"], req["paramsConfigured"], changed, err))
         return errorReply(3, err);
     if (contains(changed, "maxFrameSize"))
         (*p.fc)["maxFrameSize"] = (*p.fc)["fcData"]["maxFrameSize"];
@@ -913,11 +916,12 @@ JSON_ENTRY(getFcoeByPort)
     PortRef p = findPort(s, firstOf(req, {"indexStr", "wwn", "mac"}));
     if (!p.fc)
         return notFound("FCoE port", p.addr);
-    if (!(*p.fc)["isFCoE"].asBool())
+    const Json::Value& port = *p.fc;
+    if (!port["isFCoE"].asBool())
         return errorReply(5, "Port " + p.addr + " is not an FCoE port");
-    Json::Value r = (*p.fc)["fcoe"];
-    r["portWwn"] = (*p.fc)["wwn"];
-    r["nodeWwn"] = (*p.fc)["nodeWwn"];
+    Json::Value r = port["fcoe"];
+    r["portWwn"] = port["wwn"];
+    copyIfAny(r, "nodeWwn", port);
     return r;
 }
 
@@ -926,11 +930,11 @@ JSON_ENTRY(setFcoeByPort)
     PortRef p = findPort(s, firstOf(req, {"indexStr", "wwn", "mac"}));
     if (!p.fc)
         return notFound("FCoE port", p.addr);
-    if (!(*p.fc)["isFCoE"].asBool())
+    if (!ro(*p.fc)["isFCoE"].asBool())
         return errorReply(5, "Port " + p.addr + " is not an FCoE port");
     std::vector<std::string> changed;
     std::string err;
-    if (!applyProps((*p.fc)["fcoe"], req["fcoePort"], req["propArray"], changed, err))
+    if (!applyProps((*p.fc)["fcoe"], "fcoe", req["fcoePort"], req["propArray"], changed, err))
         return errorReply(3, err);
     return okReply("FCoE port settings updated");
 }
@@ -948,11 +952,12 @@ JSON_ENTRY(getAdvPortDataByPort)
     PortRef p = findPort(s, firstOf(req, {"indexStr", "wwn"}));
     if (!p.fc)
         return notFound("FC port", p.addr);
-    Json::Value r = (*p.fc)["advData"];
-    r["portWwn"] = (*p.fc)["wwn"];
-    r["alias"] = (*p.fc)["alias"];
-    r["trunkingEnabled"] = (*p.fc)["trunking"]["enabled"];
-    r["dportEnabled"] = (*p.fc)["dport"]["enabled"];
+    const Json::Value& port = *p.fc;
+    Json::Value r = port["advData"];
+    r["portWwn"] = port["wwn"];
+    copyIfAny(r, "alias", port);
+    r["trunkingEnabled"] = port["trunking"]["enabled"];
+    r["dportEnabled"] = port["dport"]["enabled"];
     return r;
 }
 
@@ -1004,9 +1009,9 @@ JSON_ENTRY(getOpticsSFP)
     Json::Value* port = p.fc ? p.fc : p.eth;
     if (!port)
         return notFound("port", p.addr);
-    if (!(*port)["sfp"].isObject())
+    if (!ro(*port)["sfp"].isObject())
         return errorReply(6, "No SFP present on port " + p.addr);
-    return (*port)["sfp"];
+    return replyOf(ro(*port)["sfp"]);
 }
 
 JSON_ENTRY(getOpticsPOM)
@@ -1015,7 +1020,7 @@ JSON_ENTRY(getOpticsPOM)
     Json::Value* port = p.fc ? p.fc : p.eth;
     if (!port)
         return notFound("port", p.addr);
-    if (!(*port)["sfp"].isObject())
+    if (!ro(*port)["sfp"].isObject())
         return errorReply(6, "No SFP present on port " + p.addr);
     // Readings wander a little around their nominal values.
     double t = now();
@@ -1064,7 +1069,8 @@ JSON_ENTRY(setPortAuthentication)
     Json::Value& auth = (*p.fc)["auth"];
     bool was = auth["authEnabled"].asBool();
     for (const std::string& m : a.getMemberNames()) {
-        if (auth.isMember(m) && !sameType(auth[m], a[m]))
+        std::string why;
+        if ((auth.isMember(m) && !sameType(auth[m], a[m])) || !checkMemberType("auth", m, a[m], why))
             return errorReply(3, "portAuth member " + m + " has the wrong type");
     }
     for (const std::string& m : a.getMemberNames())
@@ -1116,7 +1122,7 @@ JSON_ENTRY(getVPort)
     if (!p.fc)
         return notFound("FC port", p.addr);
     std::string vw = firstOf(req, {"lPortWwn", "vwwn"});
-    Json::Value* v = findVport(*p.fc, vw);
+    Json::Value* v = findVport(s, p.place, vw);
     if (!v)
         return notFound("virtual port", vw);
     Json::Value r = *v;
@@ -1152,11 +1158,15 @@ JSON_ENTRY(createVport)
     }
     Json::Value v(Json::objectValue);
     v["vwwn"] = vw;
-    v["nodeWwn"] = str(req, "nwwn").empty() ? (*p.fc)["nodeWwn"] : req["nwwn"];
+    if (!str(req, "nwwn").empty())
+        v["nodeWwn"] = req["nwwn"];
+    else
+        copyIfAny(v, "nodeWwn", ro(*p.fc));
     v["symbolicName"] = str(req, "symbolicName");
     v["vfId"] = req.get("vfId", 0).isInt() ? req.get("vfId", 0).asInt() : 0;
     v["remotePorts"] = Json::Value(Json::arrayValue);
     (*p.fc)["vports"].append(v);
+    indexFcPort(s, p.place);
     Json::Value r = okReply("Virtual port created");
     r["vwwn"] = vw;
     return r;
@@ -1173,27 +1183,30 @@ JSON_ENTRY(deleteVport)
     std::vector<std::string> names;
     for (const Json::Value& e : list) {
         std::string vw = e.isString() ? e.asString() : str(e, "vwwn");
-        if (!findVport(*p.fc, vw))
+        if (!findVport(s, p.place, vw))
             return notFound("virtual port", vw);
-        names.push_back(vw);
+        names.push_back(addrKey(vw));
     }
     Json::Value kept(Json::arrayValue);
-    for (const Json::Value& v : (*p.fc)["vports"]) {
+    for (const Json::Value& v : ro(*p.fc)["vports"]) {
         bool gone = false;
         for (const auto& n : names)
-            gone = gone || sameAddr(n, str(v, "vwwn"));
+            gone = gone || n == addrKey(str(v, "vwwn"));
         if (!gone)
             kept.append(v);
     }
     (*p.fc)["vports"] = kept;
+    indexFcPort(s, p.place);
     return okReply("Virtual port(s) deleted");
 }
 
-static Json::Value* remoteOwner(Json::Value& port, const std::string& lwwn)
+// The logical port a request names: the physical port itself, or one of its
+// virtual ports.
+static Json::Value* logicalPort(State& s, const PortRef& p, const std::string& lwwn)
 {
-    if (lwwn.empty() || sameAddr(lwwn, str(port, "wwn")))
-        return &port;
-    return findVport(port, lwwn);
+    if (lwwn.empty() || addrKey(lwwn) == addrKey(str(*p.fc, "wwn")))
+        return p.fc;
+    return findVport(s, p.place, lwwn);
 }
 
 static Json::Value visibleLuns(const Json::Value& port, const Json::Value& rport)
@@ -1201,8 +1214,8 @@ static Json::Value visibleLuns(const Json::Value& port, const Json::Value& rport
     Json::Value luns(Json::arrayValue);
     std::string rw = str(rport, "remotePortWwn");
     for (const Json::Value& l : rport["lunList"])
-        if (lunVisible(port, rw, l.get("number", 0).asUInt()))
-            luns.append(l);
+        if (lunVisible(port, rw, l["number"]))
+            luns.append(replyOf(l));
     return luns;
 }
 
@@ -1211,15 +1224,17 @@ JSON_ENTRY(getAllRemotePorts)
     PortRef p = findPort(s, firstOf(req, {"pPortWwn", "wwn"}));
     if (!p.fc)
         return notFound("FC port", p.addr);
-    Json::Value* owner = remoteOwner(*p.fc, str(req, "lPortWwn"));
+    const Json::Value* owner = logicalPort(s, p, str(req, "lPortWwn"));
     if (!owner)
         return notFound("logical port", str(req, "lPortWwn"));
     Json::Value r(Json::arrayValue);
     for (const Json::Value& rp : (*owner)["remotePorts"]) {
         Json::Value e = rp;
         e.removeMember("lunList");
+        e.removeMember("unchecked");
         e["numOfLuns"] = Json::UInt(visibleLuns(*p.fc, rp).size());
-        e["isTarget"] = rp["deviceData"]["isTarget"];
+        copyIfAny(e, "isTarget", rp["deviceData"]);
+        overlayUnchecked(e, rp);
         r.append(e);
     }
     return r;
@@ -1231,12 +1246,15 @@ JSON_ENTRY(getCompleteRemotePort)
     if (!p.fc)
         return notFound("FC port", p.addr);
     std::string rw = str(req, "rPortWwn");
-    Json::Value* rp = findRemotePort(*p.fc, str(req, "lPortWwn"), rw);
+    const Json::Value* rp = findRemotePort(s, p.place, str(req, "lPortWwn"), rw);
     if (!rp)
         return notFound("remote port", rw);
     Json::Value r = *rp;
-    r["lunList"] = visibleLuns(*p.fc, *rp);
-    r["pPortWwn"] = (*p.fc)["wwn"];
+    r.removeMember("unchecked");
+    if (rp->isMember("lunList"))
+        r["lunList"] = visibleLuns(*p.fc, *rp);
+    r["pPortWwn"] = ro(*p.fc)["wwn"];
+    overlayUnchecked(r, *rp);
     return r;
 }
 
@@ -1246,7 +1264,7 @@ JSON_ENTRY(getAllLunsByRemotePort)
     if (!p.fc)
         return notFound("FC port", p.addr);
     std::string rw = str(req, "rPortWwn");
-    Json::Value* rp = findRemotePort(*p.fc, str(req, "lPortWwn"), rw);
+    const Json::Value* rp = findRemotePort(s, p.place, str(req, "lPortWwn"), rw);
     if (!rp)
         return notFound("remote port", rw);
     return visibleLuns(*p.fc, *rp);
@@ -1456,7 +1474,7 @@ JSON_ENTRY(setEthPort)
     if (v.isObject() && v.isMember("mtu") && v["mtu"].isNumeric()
         && (v["mtu"].asInt() < 576 || v["mtu"].asInt() > 9600))
         return errorReply(3, "mtu out of range 576..9600");
-    if (!applyProps(*p.eth, v, req["propArray"], changed, err))
+    if (!applyProps(*p.eth, "ethPort", v, req["propArray"], changed, err))
         return errorReply(3, err);
     if (contains(changed, "portStatus")) {
         bool on = (*p.eth)["portStatus"].asBool();
@@ -1471,9 +1489,9 @@ static Json::Value ethObject(State& s, const Json::Value& req, const char* membe
     PortRef p = findPort(s, firstOf(req, {"mac", "indexStr"}));
     if (!p.eth)
         return notFound("Ethernet port", p.addr);
-    if (!(*p.eth)[member].isObject())
+    if (!ro(*p.eth)[member].isObject())
         return errorReply(9, std::string(what) + " is not available on port " + p.addr);
-    return (*p.eth)[member];
+    return ro(*p.eth)[member];
 }
 
 #ifndef DTRUJ_WITHOUT_GETLLDP
@@ -1605,8 +1623,8 @@ JSON_ENTRY(getDynamicPortStatistics)
     PortRef p = findPort(s, addr);
     if (!p.fc)
         return notFound("FC port", addr);
-    bool fcoe = (*p.fc)["isFCoE"].asBool();
-    std::string key = "port|" + plainAddr((*p.fc)["wwn"].asString());
+    bool fcoe = ro(*p.fc)["isFCoE"].asBool();
+    std::string key = "port|" + plainAddr(ro(*p.fc)["wwn"].asString());
     Json::Value r(Json::arrayValue);
     for (const StatId* e = fcoe ? fcoeStatIds : fcStatIds; e->name; ++e) {
         Json::Value el(Json::objectValue);
@@ -1781,7 +1799,7 @@ JSON_ENTRY(setDport)
     if (!req.isMember("state") || !req["state"].isBool())
         return errorReply(3, "state must be a boolean");
     bool on = req["state"].asBool();
-    if (on && (*p.fc)["isFCoE"].asBool())
+    if (on && ro(*p.fc)["isFCoE"].asBool())
         return errorReply(5, "D-Port mode is not supported on an FCoE port");
     (*p.fc)["dport"]["enabled"] = on;
     (*p.fc)["dport"]["enabledAt"] = now();
@@ -1901,9 +1919,10 @@ Json::Value prepMemory(State& s, const Json::Value& req, int& delay)
     if (!a)
         return notFound("adapter", addr);
     Json::Value cfg = s.host["diagnostics"]["memory"];
-    if ((*a)["diag"].isObject() && (*a)["diag"]["memory"].isObject())
-        for (const std::string& m : (*a)["diag"]["memory"].getMemberNames())
-            cfg[m] = (*a)["diag"]["memory"][m];
+    const Json::Value& own = ro(*a)["diag"]["memory"];
+    if (own.isObject())
+        for (const std::string& m : own.getMemberNames())
+            cfg[m] = own[m];
     bool violation = (*a)["hbaData"]["hbaStatus"].asBool() && s.host["diagnostics"]["requireOffline"].asBool();
     bool failed = violation || cfg["failed"].asBool();
     delay = violation ? 0 : cfg["durationMs"].asInt();

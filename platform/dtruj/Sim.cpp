@@ -85,11 +85,6 @@ Json::Value okReply(const std::string& message)
     return r;
 }
 
-bool sameAddr(const std::string& a, const std::string& b)
-{
-    return !a.empty() && strcasecmp(a.c_str(), b.c_str()) == 0;
-}
-
 std::string plainAddr(const std::string& colon)
 {
     std::string out;
@@ -122,34 +117,28 @@ bool parseHost(const std::string& text, Json::Value& host, std::string& err)
         err = "the host description is not a JSON object";
         return false;
     }
-    if (v.isMember("adapters") && !v["adapters"].isArray()) {
-        err = "\"adapters\" is not an array";
+    if (!checkHostTypes(v, err))
         return false;
-    }
+    // What names the adapters and ports can't be left out.
     const Json::Value& ads = v["adapters"];
     for (Json::ArrayIndex i = 0; i < ads.size(); ++i) {
         const Json::Value& a = ads[i];
-        std::string where = "adapter " + std::to_string(i + 1);
-        if (!a.isObject() || !a["hbaData"].isObject()) {
-            err = where + " has no object \"hbaData\"";
+        std::string where = "adapters[" + std::to_string(i) + "]";
+        if (!a.isMember("hbaData")) {
+            err = where + ": has no object \"hbaData\"";
             return false;
         }
         if (str(a["hbaData"], "wwn").empty() && str(a["hbaData"], "hbaMAC").empty()) {
-            err = where + " has neither \"wwn\" nor \"hbaMAC\" in \"hbaData\"";
+            err = where + ".hbaData: has neither \"wwn\" nor \"hbaMAC\"";
             return false;
         }
         for (const char* list : {"fcPorts", "ethPorts"}) {
-            if (a.isMember(list) && !a[list].isArray()) {
-                err = where + ": \"" + list + "\" is not an array";
-                return false;
-            }
-            for (const Json::Value& p : a[list]) {
-                const char* key = strcmp(list, "fcPorts") == 0 ? "wwn" : "mac";
-                if (!p.isObject() || str(p, key).empty()) {
-                    err = where + ": a member of \"" + list + "\" has no \"" + key + "\"";
+            const char* key = strcmp(list, "fcPorts") == 0 ? "wwn" : "mac";
+            for (Json::ArrayIndex j = 0; j < a[list].size(); ++j)
+                if (str(a[list][j], key).empty()) {
+                    err = where + "." + list + "[" + std::to_string(j) + "]: has no \"" + key + "\"";
                     return false;
                 }
-            }
         }
     }
     host = v;
@@ -163,132 +152,91 @@ static void def(Json::Value& obj, const char* member, const Json::Value& value)
         obj[member] = value;
 }
 
-// Fills what a hand-written description leaves out, so that every reply
-// carries the members the module reads.
+// Fills in what the library always answers whatever a description says:
+// states, and the parts that setters change or other entries answer from.
+// Every other member a description leaves out stays out of the replies.
 void normaliseHost(Json::Value& host)
 {
-    def(host, "host", Json::Value(Json::objectValue));
-    def(host, "adapters", Json::Value(Json::arrayValue));
-    def(host, "diagnostics", Json::Value(Json::objectValue));
+    const Json::Value object(Json::objectValue);
+    const Json::Value array(Json::arrayValue);
+    def(host, "host", object);
+    def(host, "adapters", array);
+    def(host, "diagnostics", object);
     Json::Value& d = host["diagnostics"];
     def(d, "requireOffline", true);
     const char* tests[] = {"loopback", "ethLoopback", "pciLoopback", "memory"};
     for (const char* t : tests) {
-        def(d, t, Json::Value(Json::objectValue));
+        def(d, t, object);
         def(d[t], "durationMs", 100);
         def(d[t], "failed", false);
         def(d[t], "output", std::string(t) + " test passed");
     }
-    def(d, "posted", Json::Value(Json::objectValue));
+    def(d, "posted", object);
 
     for (Json::Value& a : host["adapters"]) {
         Json::Value& h = a["hbaData"];
         bool cna = h.isMember("hbaMAC");
-        def(h, "wwn", "");
-        def(h, "model", cna ? "Vespera-1860" : "Vespera-1020");
-        def(h, "serialNumber", "");
-        def(h, "oem", "VSPR");
-        def(h, "partNum", "");
-        def(h, "oemSerialNum", "");
-        def(h, "uuid", "");
         def(h, "hbaStatus", true);
-        def(h, "isMezz", false);
-        def(h, "alias", "");
         def(h, "mode", cna ? "CNA" : "HBA");
-        def(a, "driver", Json::Value(Json::objectValue));
-        def(a, "firmware", Json::Value(Json::objectValue));
-        def(a["firmware"], "version", "3.2.1.0");
-        def(a["firmware"], "biosVersion", "3.2.1.0");
-        def(a, "flash", Json::Value(Json::objectValue));
+        def(a, "driver", object);
+        def(a, "firmware", object);
+        def(a, "flash", object);
         def(a["flash"], "flashStatus", true);
-        def(a, "fcPorts", Json::Value(Json::arrayValue));
-        def(a, "ethPorts", Json::Value(Json::arrayValue));
-        def(a, "advData", Json::Value(Json::objectValue));
-        def(a["advData"], "pciLocation", h.get("pciLocation", "0000:00:00.0"));
-        def(a["advData"], "pciGeneration", 2);
-        def(a["advData"], "pciLanes", 8);
-        def(a["advData"], "chipRevision", "Rev-C2");
-        def(a["advData"], "temperatureC", 47);
-        int n = 0;
+        def(a, "advData", object);
+        if (h.isMember("pciLocation"))
+            def(a["advData"], "pciLocation", h["pciLocation"]);
+        def(a, "fcPorts", array);
+        def(a, "ethPorts", array);
         for (Json::Value& p : a["fcPorts"]) {
-            def(p, "nodeWwn", h["wwn"]);
-            def(p, "PortSymbolicName", h["model"].asString() + " port" + std::to_string(n));
-            def(p, "operatingSpeed", 8);
-            def(p, "supportedPortSpeeds", Json::Value(Json::arrayValue));
-            if (p["supportedPortSpeeds"].empty())
-                p["supportedPortSpeeds"].append(p["operatingSpeed"]);
-            def(p, "portTypeMOFValue", 10);
-            def(p, "maxFrameSize", 2112);
+            // A port's node is its adapter's unless it says otherwise.
+            if (h.isMember("wwn"))
+                def(p, "nodeWwn", h["wwn"]);
             def(p, "portStatusValue", 11);
-            def(p, "isFCoE", false);
-            def(p, "beaconState", false);
             def(p, "portStatus", true);
             def(p, "linkUp", true);
-            def(p, "alias", "");
-            def(p, "remotePorts", Json::Value(Json::arrayValue));
-            def(p, "vports", Json::Value(Json::arrayValue));
-            def(p, "lunMask", Json::Value(Json::objectValue));
+            def(p, "remotePorts", array);
+            def(p, "vports", array);
+            def(p, "lunMask", object);
             def(p["lunMask"], "enabled", false);
-            def(p["lunMask"], "entries", Json::Value(Json::arrayValue));
-            def(p, "ioProfiles", Json::Value(Json::arrayValue));
-            def(p, "auth", Json::Value(Json::objectValue));
+            def(p["lunMask"], "entries", array);
+            def(p, "ioProfiles", array);
+            def(p, "auth", object);
             def(p["auth"], "authEnabled", false);
-            def(p["auth"], "algorithm", "MD5");
-            def(p["auth"], "hashGroup", "DH-NULL");
-            def(p, "trunking", Json::Value(Json::objectValue));
+            def(p, "trunking", object);
             def(p["trunking"], "enabled", false);
-            def(p, "bootOverSan", Json::Value(Json::objectValue));
+            def(p, "bootOverSan", object);
             def(p["bootOverSan"], "enabled", false);
-            def(p["bootOverSan"], "bootLuns", Json::Value(Json::arrayValue));
-            def(p, "fcData", Json::Value(Json::objectValue));
-            def(p["fcData"], "topology", "P2P");
-            def(p["fcData"], "configuredSpeed", "auto");
-            def(p["fcData"], "maxFrameSize", p["maxFrameSize"]);
-            def(p["fcData"], "bbCredit", 16);
-            def(p["fcData"], "pathTov", 30);
-            def(p["fcData"], "qosEnabled", false);
-            def(p["fcData"], "targetRateLimit", false);
-            def(p, "advData", Json::Value(Json::objectValue));
-            def(p["advData"], "pid", "0x0" + std::to_string(10100 + n * 100));
-            def(p["advData"], "fabricName", "10:00:00:05:33:00:00:01");
-            def(p["advData"], "topology", "P2P");
-            def(p["advData"], "bbCredit", 16);
-            def(p, "dport", Json::Value(Json::objectValue));
+            def(p, "fcData", object);
+            if (p.isMember("maxFrameSize"))
+                def(p["fcData"], "maxFrameSize", p["maxFrameSize"]);
+            def(p, "advData", object);
+            def(p, "dport", object);
             def(p["dport"], "enabled", false);
-            def(p, "logs", Json::Value(Json::arrayValue));
-            def(p, "diag", Json::Value(Json::objectValue));
-            if (p["isFCoE"].asBool()) {
-                def(p, "fcoe", Json::Value(Json::objectValue));
-                def(p["fcoe"], "fcoeMac", p.get("fcoeMac", ""));
-                def(p["fcoe"], "vlanId", 1002);
-                def(p["fcoe"], "fipMode", "auto");
+            def(p, "logs", array);
+            if (p.isMember("isFCoE") && p["isFCoE"].asBool()) {
+                def(p, "fcoe", object);
+                if (p.isMember("fcoeMac"))
+                    def(p["fcoe"], "fcoeMac", p["fcoeMac"]);
             }
-            for (Json::Value& r : p["remotePorts"]) {
-                def(r, "remoteNodeWwn", r.get("remotePortWwn", ""));
-                def(r, "deviceData", Json::Value(Json::objectValue));
-                def(r["deviceData"], "isTarget", true);
-                def(r["deviceData"], "type", "Disk");
-                def(r["deviceData"], "stateMofValue", 2);
-                def(r, "lunList", Json::Value(Json::arrayValue));
-            }
+            // A remote port that the library can read is logged in.
+            for (Json::Value& r : p["remotePorts"])
+                if (r.isMember("deviceData"))
+                    def(r["deviceData"], "stateMofValue", 2);
             for (Json::Value& v : p["vports"]) {
-                def(v, "nodeWwn", p["nodeWwn"]);
-                def(v, "symbolicName", "");
-                def(v, "vfId", 0);
-                def(v, "remotePorts", Json::Value(Json::arrayValue));
+                if (p.isMember("nodeWwn"))
+                    def(v, "nodeWwn", p["nodeWwn"]);
+                def(v, "remotePorts", array);
+                for (Json::Value& r : v["remotePorts"])
+                    if (r.isMember("deviceData"))
+                        def(r["deviceData"], "stateMofValue", 2);
             }
-            ++n;
         }
-        int e = 0;
         for (Json::Value& p : a["ethPorts"]) {
-            def(p, "ethDev", "eth" + std::to_string(e));
             def(p, "ethPortStateMOFValue", 11);
-            def(p, "mtu", 1500);
             def(p, "portStatus", true);
             def(p, "linkUp", true);
-            def(p, "alias", "");
-            def(p, "operatingSpeed", 10);
-            def(p, "vnics", Json::Value(Json::arrayValue));
+            // Every port has its base PCI function.
+            def(p, "vnics", array);
             if (p["vnics"].empty()) {
                 Json::Value v;
                 v["pciFunctionIndex"] = 0;
@@ -297,7 +245,6 @@ void normaliseHost(Json::Value& host)
                 v["maxBandwidth"] = 100;
                 p["vnics"].append(v);
             }
-            ++e;
         }
     }
 }
@@ -334,6 +281,7 @@ bool loadHost(State& s, std::string& err)
         return false;
     }
     s.host = host;
+    indexHost(s);
     s.source = source;
     s.loaded = true;
     s.faults.clear();
@@ -368,76 +316,195 @@ std::string adapterIndex(const Json::Value& adapter)
     return adapterIsCNA(adapter) ? h["hbaMAC"].asString() : h["wwn"].asString();
 }
 
-Json::Value* findAdapter(State& s, const std::string& addr, int* id)
+std::string addrKey(const std::string& addr)
 {
-    Json::Value& ads = s.host["adapters"];
-    for (Json::ArrayIndex i = 0; i < ads.size(); ++i) {
-        const Json::Value& h = ads[i]["hbaData"];
-        if (sameAddr(addr, str(h, "hbaMAC")) || sameAddr(addr, str(h, "wwn"))
-            || sameAddr(addr, plainAddr(str(h, "hbaMAC"))) || sameAddr(addr, plainAddr(str(h, "wwn")))) {
-            if (id)
-                *id = int(i) + 1;
-            return &ads[i];
+    std::string key;
+    key.reserve(addr.size());
+    for (char c : addr)
+        if (c != ':')
+            key += char(tolower((unsigned char)c));
+    return key;
+}
+
+// The first of two parts with one address keeps it, as a walk would find it.
+template <class Map, class Place>
+static void note(Map& map, const std::string& addr, const Place& place)
+{
+    std::string key = addrKey(addr);
+    if (!key.empty())
+        map.emplace(key, place);
+}
+
+void indexFcPort(State& s, PortPlace where)
+{
+    HostIndex& ix = s.index;
+    FcPortIndex& below = ix.below[where.adapter][where.port];
+    for (const auto& v : below.vports) {
+        auto it = ix.vports.find(v.first);
+        if (it != ix.vports.end() && it->second.adapter == where.adapter
+            && it->second.port == where.port)
+            ix.vports.erase(it);
+    }
+    below = FcPortIndex();
+
+    const Json::Value& host = s.host;
+    const Json::Value& port = host["adapters"][where.adapter]["fcPorts"][where.port];
+    auto remotes = [&below](const std::string& owner, const Json::Value& list) {
+        for (Json::ArrayIndex r = 0; r < list.size(); ++r) {
+            std::string key = addrKey(str(list[r], "remotePortWwn"));
+            if (!key.empty())
+                below.remotePorts.emplace(owner + "|" + key, r);
+        }
+    };
+    remotes("", port["remotePorts"]);
+    const Json::Value& vports = port["vports"];
+    for (Json::ArrayIndex v = 0; v < vports.size(); ++v) {
+        std::string key = addrKey(str(vports[v], "vwwn"));
+        if (key.empty())
+            continue;
+        below.vports.emplace(key, v);
+        ix.vports.emplace(key, where);
+        remotes(key, vports[v]["remotePorts"]);
+    }
+}
+
+void indexHost(State& s)
+{
+    s.index = HostIndex();
+    HostIndex& ix = s.index;
+    const Json::Value& ads = static_cast<const Json::Value&>(s.host)["adapters"];
+    ix.below.resize(ads.size());
+    for (Json::ArrayIndex a = 0; a < ads.size(); ++a) {
+        const Json::Value& h = ads[a]["hbaData"];
+        note(ix.adapters, str(h, "hbaMAC"), a);
+        note(ix.adapters, str(h, "wwn"), a);
+        const Json::Value& fc = ads[a]["fcPorts"];
+        ix.below[a].resize(fc.size());
+        for (Json::ArrayIndex p = 0; p < fc.size(); ++p) {
+            PortPlace where;
+            where.adapter = a;
+            where.port = p;
+            note(ix.fcPorts, str(fc[p], "wwn"), where);
+            note(ix.fcPorts, str(fc[p], "fcoeMac"), where);
+        }
+        const Json::Value& eth = ads[a]["ethPorts"];
+        for (Json::ArrayIndex p = 0; p < eth.size(); ++p) {
+            PortPlace where;
+            where.adapter = a;
+            where.port = p;
+            note(ix.ethPorts, str(eth[p], "mac"), where);
         }
     }
-    return nullptr;
+    for (Json::ArrayIndex a = 0; a < ads.size(); ++a)
+        for (Json::ArrayIndex p = 0; p < ix.below[a].size(); ++p) {
+            PortPlace where;
+            where.adapter = a;
+            where.port = p;
+            indexFcPort(s, where);
+        }
 }
 
-Json::Value* findFcPort(State& s, const std::string& wwn, Json::Value** adapter)
+Json::Value* findAdapter(State& s, const std::string& addr, int* id)
 {
-    for (Json::Value& a : s.host["adapters"])
-        for (Json::Value& p : a["fcPorts"])
-            if (sameAddr(wwn, str(p, "wwn")) || sameAddr(wwn, str(p, "fcoeMac"))
-                || sameAddr(wwn, plainAddr(str(p, "wwn")))) {
-                if (adapter)
-                    *adapter = &a;
-                return &p;
-            }
-    return nullptr;
+    auto it = s.index.adapters.find(addrKey(addr));
+    if (it == s.index.adapters.end())
+        return nullptr;
+    if (id)
+        *id = int(it->second) + 1;
+    return &s.host["adapters"][it->second];
 }
 
-Json::Value* findEthPort(State& s, const std::string& mac, Json::Value** adapter)
+static Json::Value* portAt(State& s, const std::unordered_map<std::string, PortPlace>& map,
+                           const char* list, const std::string& addr, Json::Value** adapter,
+                           PortPlace* where)
 {
-    for (Json::Value& a : s.host["adapters"])
-        for (Json::Value& p : a["ethPorts"])
-            if (sameAddr(mac, str(p, "mac")) || sameAddr(mac, plainAddr(str(p, "mac")))) {
-                if (adapter)
-                    *adapter = &a;
-                return &p;
-            }
-    return nullptr;
+    auto it = map.find(addrKey(addr));
+    if (it == map.end())
+        return nullptr;
+    Json::Value& a = s.host["adapters"][it->second.adapter];
+    if (adapter)
+        *adapter = &a;
+    if (where)
+        *where = it->second;
+    return &a[list][it->second.port];
 }
 
-Json::Value* findVport(Json::Value& port, const std::string& vwwn)
+Json::Value* findFcPort(State& s, const std::string& wwn, Json::Value** adapter, PortPlace* where)
 {
-    for (Json::Value& v : port["vports"])
-        if (sameAddr(vwwn, str(v, "vwwn")))
-            return &v;
-    return nullptr;
+    return portAt(s, s.index.fcPorts, "fcPorts", wwn, adapter, where);
+}
+
+Json::Value* findEthPort(State& s, const std::string& mac, Json::Value** adapter, PortPlace* where)
+{
+    return portAt(s, s.index.ethPorts, "ethPorts", mac, adapter, where);
+}
+
+static Json::Value& fcPortAt(State& s, PortPlace where)
+{
+    return s.host["adapters"][where.adapter]["fcPorts"][where.port];
+}
+
+Json::Value* findVport(State& s, PortPlace where, const std::string& vwwn)
+{
+    const FcPortIndex& below = s.index.below[where.adapter][where.port];
+    auto it = below.vports.find(addrKey(vwwn));
+    if (it == below.vports.end())
+        return nullptr;
+    return &fcPortAt(s, where)["vports"][it->second];
 }
 
 // The remote ports seen through a logical port: the physical port itself or
 // one of its virtual ports.
-Json::Value* findRemotePort(Json::Value& port, const std::string& lwwn, const std::string& rwwn)
+Json::Value* findRemotePort(State& s, PortPlace where, const std::string& lwwn,
+                            const std::string& rwwn)
 {
-    Json::Value* owner = &port;
-    if (!lwwn.empty() && !sameAddr(lwwn, str(port, "wwn"))) {
-        owner = findVport(port, lwwn);
-        if (!owner)
+    Json::Value& port = fcPortAt(s, where);
+    std::string owner;
+    Json::Value* ownerPort = &port;
+    if (!lwwn.empty() && addrKey(lwwn) != addrKey(str(port, "wwn"))) {
+        ownerPort = findVport(s, where, lwwn);
+        if (!ownerPort)
             return nullptr;
+        owner = addrKey(lwwn);
     }
-    for (Json::Value& r : (*owner)["remotePorts"])
-        if (sameAddr(rwwn, str(r, "remotePortWwn")))
-            return &r;
-    return nullptr;
+    const FcPortIndex& below = s.index.below[where.adapter][where.port];
+    auto it = below.remotePorts.find(owner + "|" + addrKey(rwwn));
+    if (it == below.remotePorts.end())
+        return nullptr;
+    return &(*ownerPort)["remotePorts"][it->second];
+}
+
+bool wwnTaken(State& s, const std::string& wwn)
+{
+    std::string key = addrKey(wwn);
+    return s.index.fcPorts.count(key) || s.index.vports.count(key);
 }
 
 // ---------------------------------------------------------------- replies
 
-Json::Value hbaReply(State&, Json::Value& a, int id)
+void overlayUnchecked(Json::Value& reply, const Json::Value& source)
+{
+    if (!source.isObject() || !source.isMember("unchecked"))
+        return;
+    const Json::Value& u = source["unchecked"];
+    for (const std::string& m : u.getMemberNames())
+        reply[m] = u[m];
+}
+
+Json::Value replyOf(const Json::Value& part)
+{
+    Json::Value r = part;
+    if (r.isObject())
+        r.removeMember("unchecked");
+    overlayUnchecked(r, part);
+    return r;
+}
+
+Json::Value hbaReply(State&, const Json::Value& a, int id)
 {
     Json::Value r(Json::objectValue);
     Json::Value h = a["hbaData"];
+    h.removeMember("unchecked");
     h["portCount"] = Json::UInt(a["fcPorts"].size() + a["ethPorts"].size());
     h["numOfFcPorts"] = Json::UInt(a["fcPorts"].size());
     h["numOfEthPorts"] = Json::UInt(a["ethPorts"].size());
@@ -446,9 +513,11 @@ Json::Value hbaReply(State&, Json::Value& a, int id)
     h["adapterId"] = id;
     h["indexStr"] = adapterIndex(a);
     h["manufacturer"] = "VSPR";
+    overlayUnchecked(h, a["hbaData"]);
     r["hbaData"] = h;
     r["driver"] = a["driver"];
     r["firmware"] = a["firmware"];
+    overlayUnchecked(r, a);
     return r;
 }
 
@@ -456,7 +525,7 @@ Json::Value hbaReply(State&, Json::Value& a, int id)
 static const char* const portNested[] = {
     "sfp", "pom", "remotePorts", "vports", "auth", "bootOverSan", "advData", "fcoe",
     "lunMask", "ioProfiles", "dport", "fcData", "diag", "logs", "trunking", "lldp",
-    "cee", "vnics", "linkUp", nullptr};
+    "cee", "vnics", "linkUp", "unchecked", nullptr};
 
 static Json::Value portCopy(const Json::Value& port)
 {
@@ -472,6 +541,13 @@ static Json::Value portCopy(const Json::Value& port)
     return r;
 }
 
+// A mezzanine card's ports say so; a port may also say it of itself.
+static void copyMezz(Json::Value& r, const Json::Value& a)
+{
+    if (!r.isMember("isMezz") && a["hbaData"].isMember("isMezz"))
+        r["isMezz"] = a["hbaData"]["isMezz"];
+}
+
 Json::Value fcPortReply(const Json::Value& a, const Json::Value& p)
 {
     Json::Value r = portCopy(p);
@@ -483,12 +559,12 @@ Json::Value fcPortReply(const Json::Value& a, const Json::Value& p)
     // No speed is negotiated while the link is down.
     if (!up || !p["linkUp"].asBool())
         r["operatingSpeed"] = 99999;
-    if (!r.isMember("isMezz"))
-        r["isMezz"] = a["hbaData"]["isMezz"];
+    copyMezz(r, a);
     r["hbaIndexStr"] = adapterIndex(a);
     r["trunkingEnabled"] = p["trunking"]["enabled"];
     r["numOfVports"] = Json::UInt(p["vports"].size());
     r["numOfRemotePorts"] = Json::UInt(p["remotePorts"].size());
+    overlayUnchecked(r, p);
     return r;
 }
 
@@ -502,20 +578,27 @@ Json::Value ethPortReply(const Json::Value& a, const Json::Value& p)
         r["ethPortStateMOFValue"] = 13;
     if (!up || !p["linkUp"].asBool())
         r["operatingSpeed"] = 99999;
-    r["isMezz"] = a["hbaData"]["isMezz"];
+    copyMezz(r, a);
     r["hbaIndexStr"] = adapterIndex(a);
     r["numOfvNICs"] = Json::UInt(p["vnics"].size());
+    overlayUnchecked(r, p);
     return r;
 }
 
-bool lunVisible(const Json::Value& port, const std::string& rwwn, unsigned number)
+bool lunVisible(const Json::Value& port, const std::string& rwwn, const Json::Value& number)
 {
     const Json::Value& m = port["lunMask"];
     if (!m["enabled"].asBool())
         return true;
-    for (const Json::Value& e : m["entries"])
-        if (sameAddr(rwwn, str(e, "rPortWwn")) && e["lunId"].asString() == std::to_string(number))
+    if (!number.isUInt())
+        return false;
+    std::string n = std::to_string(number.asUInt());
+    for (const Json::Value& e : m["entries"]) {
+        const Json::Value& id = e["lunId"];
+        std::string lun = id.isString() ? id.asString() : id.isUInt() ? std::to_string(id.asUInt()) : "";
+        if (addrKey(rwwn) == addrKey(str(e, "rPortWwn")) && !addrKey(rwwn).empty() && lun == n)
             return true;
+    }
     return false;
 }
 

@@ -10,6 +10,7 @@
 #include <mutex>
 #include <string>
 #include <thread>
+#include <unordered_map>
 #include <vector>
 
 #include "dtruj.h"
@@ -39,6 +40,33 @@ struct DiagRun {
     double cancelTime = 0;
 };
 
+// Where an FC or Ethernet port lies: its adapter's place and its own.
+struct PortPlace {
+    Json::ArrayIndex adapter = 0;
+    Json::ArrayIndex port = 0;
+};
+
+// The look-ups below one FC port.
+struct FcPortIndex {
+    std::unordered_map<std::string, Json::ArrayIndex> vports;   // place in "vports"
+    // A remote port by its logical port and its WWN: "" (the physical port
+    // itself) or the virtual port's key, "|", the remote key -> its place in
+    // that logical port's "remotePorts".
+    std::unordered_map<std::string, Json::ArrayIndex> remotePorts;
+};
+
+// Addresses to places, so that a look-up never walks the host: a console
+// polls large hosts port by port. Keys are addresses without colons, in
+// lower case (addrKey). Built whenever the host is loaded; the entries that
+// add or remove virtual ports mend what they touch.
+struct HostIndex {
+    std::unordered_map<std::string, Json::ArrayIndex> adapters;  // "wwn" and "hbaMAC"
+    std::unordered_map<std::string, PortPlace> fcPorts;          // "wwn" and "fcoeMac"
+    std::unordered_map<std::string, PortPlace> ethPorts;
+    std::unordered_map<std::string, PortPlace> vports;           // their physical port
+    std::vector<std::vector<FcPortIndex>> below;                 // [adapter][FC port]
+};
+
 struct State {
     ~State();                       // joins the event thread a caller left running
 
@@ -47,6 +75,7 @@ struct State {
     bool initialised = false;
     std::string source;             // where the host description came from
     Json::Value host;               // the simulated host; setters change it
+    HostIndex index;                // of host
     std::map<std::string, Fault> faults;
     std::map<std::string, double> resets;   // statistics key prefix -> time of reset
     std::map<std::string, DiagRun> runs;
@@ -81,6 +110,13 @@ enum { SL_DEBUG = 1, SL_INFO = 2, SL_WARN = 3, SL_ERROR = 4 };
 // Host description.
 bool loadHost(State& s, std::string& err);       // caller holds s.mtx
 bool parseHost(const std::string& text, Json::Value& host, std::string& err);
+// Refuses a member of a type other than its own, naming it by its path
+// ("adapters[0].ethPorts[1].mtu: expected a number").
+bool checkHostTypes(const Json::Value& host, std::string& err);
+// The same for one member of a part ("fcPort", "ethPort", "fcData", "fcoe",
+// "auth") that a setter is about to write; a member of no known type passes.
+bool checkMemberType(const char* part, const std::string& name, const Json::Value& value,
+                     std::string& err);
 void normaliseHost(Json::Value& host);
 const char* builtinHostText();
 
@@ -88,24 +124,41 @@ const char* builtinHostText();
 Json::Value errorReply(int code, const std::string& message);
 Json::Value okReply(const std::string& message);
 
-bool sameAddr(const std::string& a, const std::string& b);
 std::string plainAddr(const std::string& colon);
 std::string str(const Json::Value& v, const char* member);
 
-// Look-ups in the host. Each returns null when nothing matches.
+// The index. indexFcPort builds the part below one FC port again, after
+// its virtual ports changed.
+std::string addrKey(const std::string& addr);
+void indexHost(State& s);
+void indexFcPort(State& s, PortPlace where);
+
+// Look-ups in the host, by either text form and without regard to case.
+// Each returns null when nothing matches.
 Json::Value* findAdapter(State& s, const std::string& addr, int* id = nullptr);
-Json::Value* findFcPort(State& s, const std::string& wwn, Json::Value** adapter = nullptr);
-Json::Value* findEthPort(State& s, const std::string& mac, Json::Value** adapter = nullptr);
-Json::Value* findVport(Json::Value& port, const std::string& vwwn);
-Json::Value* findRemotePort(Json::Value& port, const std::string& lwwn, const std::string& rwwn);
+Json::Value* findFcPort(State& s, const std::string& wwn, Json::Value** adapter = nullptr,
+                        PortPlace* where = nullptr);
+Json::Value* findEthPort(State& s, const std::string& mac, Json::Value** adapter = nullptr,
+                         PortPlace* where = nullptr);
+Json::Value* findVport(State& s, PortPlace where, const std::string& vwwn);
+// lwwn empty or the port's own WWN: the physical port's remote ports.
+Json::Value* findRemotePort(State& s, PortPlace where, const std::string& lwwn,
+                            const std::string& rwwn);
+// True if an FC port or a virtual port has the WWN.
+bool wwnTaken(State& s, const std::string& wwn);
 std::string adapterIndex(const Json::Value& adapter);
 bool adapterIsCNA(const Json::Value& adapter);
 
 // Replies built from the host.
-Json::Value hbaReply(State& s, Json::Value& adapter, int id);
+Json::Value hbaReply(State& s, const Json::Value& adapter, int id);
 Json::Value fcPortReply(const Json::Value& adapter, const Json::Value& port);
 Json::Value ethPortReply(const Json::Value& adapter, const Json::Value& port);
-bool lunVisible(const Json::Value& port, const std::string& rwwn, unsigned number);
+bool lunVisible(const Json::Value& port, const std::string& rwwn, const Json::Value& number);
+// The members under "unchecked" of a part of the host replace those of the
+// reply built from it, whatever their type.
+void overlayUnchecked(Json::Value& reply, const Json::Value& source);
+// A copy of a part of the host as a reply: without "unchecked", overlaid.
+Json::Value replyOf(const Json::Value& part);
 
 // Counters that grow with time since their last reset.
 uint64_t counterValue(State& s, const std::string& key, const std::string& name);

@@ -108,6 +108,14 @@ TEST(EthernetHelper, RecordsAndStates)
         destroy(e);
     }
 
+    // A port that told no device name keeps its endpoint, under the empty
+    // name.
+    memset(info.deviceName, 0, sizeof(info.deviceName));
+    VESPERA_LANEndpoint* e = helper()->getLANEndpointInstance(info);
+    EXPECT_EQ(0, e->Name.null);
+    EXPECT_EQ("", str(e->Name.value));
+    destroy(e);
+
     EXPECT_EQ(108, helper()->getPortType("10G_BASE-LRM"));
     EXPECT_EQ(0, helper()->getPortType("10g_base-sr"));
     EXPECT_EQ(0, helper()->getPortType(0));

@@ -170,9 +170,10 @@ TEST_F(EthernetCim, FaultsOfAHostDescription)
       { "hbaData": { "wwn": "20:00:00:05:1e:02:00:00", "hbaMAC": "00:05:1e:02:00:00" },
         "ethPorts": [
           { "mac": "00:05:1e:02:00:01", "ethDev": "eth10" },
-          { "mac": "00:05:1e:02:00:02", "ethDev": "eth11", "ethPortStateMOFValue": 7, "mtu": null,
-            "sfp": { "transceiver": "10G_BASE-SR" } },
-          { "mac": "00:05:1e:02:00:03", "ethDev": ["eth12"], "ethPortStateMOFValue": "11",
+          { "mac": "00:05:1e:02:00:02", "ethDev": "eth11", "ethPortStateMOFValue": 7,
+            "unchecked": { "mtu": null }, "sfp": { "transceiver": "10G_BASE-SR" } },
+          { "mac": "00:05:1e:02:00:03",
+            "unchecked": { "ethDev": ["eth12"], "ethPortStateMOFValue": "11" },
             "sfp": { "transceiver": "10G_BASE-LR" } },
           { "mac": "00:05:1e:02:00:04", "portStatus": false, "mtu": 2000, "ethDev": ")") +
         std::string(3000, 'n') + R"(" } ] },
@@ -199,11 +200,14 @@ TEST_F(EthernetCim, FaultsOfAHostDescription)
     EXPECT_EQ(0, p["00051e030001"]["PortNumber"].asInt());
     EXPECT_EQ(105, p["00051e030001"]["PortType"].asInt());
 
-    // The port without a device name has no endpoint: it would have no key.
+    // The port without a device name is an endpoint all the same, named by
+    // the empty name.
     Reply ends = ei("VESPERA_LANEndpoint", host);
     std::map<std::string, Props> e = by(ends, "MACAddress");
-    ASSERT_EQ(3u, e.size()) << ends.log;
-    EXPECT_EQ(1u, count(ends.log, "ERR", "No LAN endpoint for 00:05:1e:02:00:03"));
+    ASSERT_EQ(4u, e.size()) << ends.log;
+    EXPECT_EQ("", e["00051e020003"]["Name"].asString());
+    EXPECT_EQ("", e["00051e020003"]["ElementName"].asString());
+    EXPECT_EQ(1u, count(ends.log, "WARN", "No Ethernet device name for 00051e020003"));
     EXPECT_EQ(0u, e["00051e020002"]["MaxDataSize"].asUInt());
     EXPECT_EQ(0, e["00051e020002"]["HealthState"].asInt());
     EXPECT_EQ(1, e["00051e020002"]["EnabledState"].asInt());

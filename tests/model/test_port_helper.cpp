@@ -20,9 +20,10 @@ namespace
 {
 
 // An FC HBA with two ports on one node WWN (the second without light), and
-// a mezzanine card with one FCoE port.
+// a mezzanine card with one FCoE port, whose first supported speed is the
+// figure that means "no speed" for a current speed.
 const char* const HOST = R"({ "adapters": [
-  { "hbaData": { "wwn": "20:00:00:00:c9:aa:00:00" },
+  { "hbaData": { "wwn": "20:00:00:00:c9:aa:00:00", "isMezz": false },
     "fcPorts": [
       { "wwn": "10:00:00:00:c9:aa:00:01", "nodeWwn": "20:00:00:00:c9:aa:00:00",
         "operatingSpeed": 8, "supportedPortSpeeds": [16, 8], "beaconState": true,
@@ -34,9 +35,10 @@ const char* const HOST = R"({ "adapters": [
           { "remotePortWwn": "50:00:00:00:00:00:00:03",
             "deviceData": { "isTarget": true, "type": "Tape", "stateMofValue": 8 } } ] },
       { "wwn": "10:00:00:00:c9:aa:00:02", "nodeWwn": "20:00:00:00:c9:aa:00:00",
-        "operatingSpeed": 8, "supportedPortSpeeds": [8], "linkUp": false } ] },
+        "operatingSpeed": 8, "supportedPortSpeeds": [8], "linkUp": false, "beaconState": false } ] },
   { "hbaData": { "wwn": "20:00:00:00:c9:bb:00:00", "isMezz": true },
-    "fcPorts": [ { "wwn": "10:00:00:00:c9:bb:00:01", "operatingSpeed": 10, "isFCoE": true } ] } ] })";
+    "fcPorts": [ { "wwn": "10:00:00:00:c9:bb:00:01", "operatingSpeed": 10,
+                   "supportedPortSpeeds": [99999], "isFCoE": true, "beaconState": false } ] } ] })";
 
 const char* const LEFT = "10000000c9aa0001";
 const char* const RIGHT = "10000000c9aa0002";
@@ -81,16 +83,26 @@ TEST_F(PortHelperTest, PortsGroupsEndpointsAndBeaconsOfEveryAdapter)
     EXPECT_EQ(0u, right->Speed.value);
     EXPECT_EQ(0, right->Speed.null);
 
-    EXPECT_EQ(MEZZ, str(ports.at<VESPERA_FCPort>(2)->DeviceID.value));
-    EXPECT_EQ(0, ports.at<VESPERA_FCPort>(2)->PortNumber.value);
+    // 99999 is no speed only for the current speed.
+    VESPERA_FCPort* mezz = ports.at<VESPERA_FCPort>(2);
+    EXPECT_EQ(MEZZ, str(mezz->DeviceID.value));
+    EXPECT_EQ(0, mezz->PortNumber.value);
+    EXPECT_EQ(10000000000ULL, mezz->Speed.value);
+    EXPECT_EQ(99999000000000ULL, mezz->MaxSpeed.value);
 
-    // Two ports of one node: one group id, two names.
+    // A node is one group, however many ports it has, named by its WWN.
     Walk groups(helper()->getInstancesByClass(ID_VESPERA_LogicalPortGroup));
-    ASSERT_EQ(3u, groups.size());
-    EXPECT_EQ("20000000c9aa0000", str(groups.at<VESPERA_LogicalPortGroup>(0)->InstanceID.value));
-    EXPECT_EQ("20000000c9aa0000", str(groups.at<VESPERA_LogicalPortGroup>(1)->InstanceID.value));
-    EXPECT_EQ(LEFT, key<VESPERA_LogicalPortGroup>(groups, 0));
-    EXPECT_EQ(RIGHT, key<VESPERA_LogicalPortGroup>(groups, 1));
+    ASSERT_EQ(2u, groups.size());
+    for (size_t i = 0; i < 2; i++)
+    {
+        VESPERA_LogicalPortGroup* g = groups.at<VESPERA_LogicalPortGroup>(i);
+        std::string node = i == 0 ? "20000000c9aa0000" : "20000000c9bb0000";
+        EXPECT_EQ(node, str(g->InstanceID.value));
+        EXPECT_EQ(node, str(g->Name.value));
+        EXPECT_EQ(node, str(g->ElementName.value));
+        EXPECT_EQ("WWN", str(g->NameFormat.value));
+        EXPECT_EQ(hostString(), str(g->Caption.value));
+    }
 
     // Each port, then its targets in remote order; the initiator is no
     // target. A target's name is longer than a WWN field.
@@ -299,16 +311,23 @@ TEST_F(PortHelperTest, OddRepliesGiveZerosAndCutTextsNeverMore)
     EXPECT_EQ(1u, log.count("INFO", "beaconState is NOT available failed for " +
         std::string(LEFT) + "."));
 
+    // Only a port that names its node has a group: here the cut one.
+    Walk cut(helper()->getInstancesByClass(ID_VESPERA_LogicalPortGroup));
+    ASSERT_EQ(1u, cut.size());
+    EXPECT_EQ(std::string(23, 'a'), str(cut.at<VESPERA_LogicalPortGroup>(0)->InstanceID.value));
+    EXPECT_EQ(1u, log.count("WARN", "No logical port group for " + std::string(MEZZ)));
+
     // Replies that are no object, and port lists with holes.
     get.on("10:00:00:00:c9:aa:00:01", parse("[1, 2]"));
     get.on("10:00:00:00:c9:aa:00:02", Json::Value("text"));
+    get.on("10:00:00:00:c9:bb:00:01", parse(R"({"nodeWwn": "20:00:00:00:c9:bb:00:00"})"));
     Script<libGetFcPhyPortIndicesByAdapter> ports("indexStr");
     ports.on("20:00:00:00:c9:bb:00:00", parse(R"({"indexStrings": [7, null,
         "10:00:00:00:c9:bb:00:01"]})"));
 
     Walk groups(helper()->getInstancesByClass(ID_VESPERA_LogicalPortGroup));
     ASSERT_EQ(1u, groups.size());
-    EXPECT_EQ(MEZZ, key<VESPERA_LogicalPortGroup>(groups, 0));
+    EXPECT_EQ("20000000c9bb0000", key<VESPERA_LogicalPortGroup>(groups, 0));
     EXPECT_EQ(2u, log.count("ERR", "libGetPortByWwn response is null or has error"));
     EXPECT_EQ(2u, log.count("ERR", "has no index string"));
 }

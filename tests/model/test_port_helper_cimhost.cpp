@@ -9,6 +9,7 @@
 #include <sys/stat.h>
 #include <sys/wait.h>
 
+#include <algorithm>
 #include <set>
 
 using namespace port_test;
@@ -152,8 +153,8 @@ TEST_F(PortStandIn, FCPortsAndGroupsOfTheDefaultHost)
     std::vector<Props> got = enumerate("VESPERA_FCPort");
     std::vector<Props> groups = enumerate("VESPERA_LogicalPortGroup");
     std::vector<Port> want = ports();
+    std::vector<std::string> nodes;
     ASSERT_EQ(want.size(), got.size());
-    ASSERT_EQ(want.size(), groups.size());
 
     for (size_t i = 0; i < want.size(); i++)
     {
@@ -182,12 +183,21 @@ TEST_F(PortStandIn, FCPortsAndGroupsOfTheDefaultHost)
         EXPECT_EQ(p.get("maxFrameSize", 2112).asUInt64(),
             f["SupportedMaximumTransmissionUnit"].asUInt64());
 
+        if (std::find(nodes.begin(), nodes.end(), node) == nodes.end())
+            nodes.push_back(node);
+    }
+
+    // One group a node, in the order the ports show them.
+    ASSERT_EQ(nodes.size(), groups.size());
+    for (size_t i = 0; i < nodes.size(); i++)
+    {
         Props& g = groups[i];
-        EXPECT_EQ(node, g["InstanceID"].asString());
-        EXPECT_EQ(wwn, g["Name"].asString());
+        EXPECT_EQ(nodes[i], g["InstanceID"].asString());
+        EXPECT_EQ(nodes[i], g["Name"].asString());
+        EXPECT_EQ(nodes[i], g["ElementName"].asString());
         EXPECT_EQ("WWN", g["NameFormat"].asString());
-        EXPECT_EQ(node + ":" + wwn, g["ElementName"].asString());
         EXPECT_EQ(hostString(), g["Caption"].asString());
+        EXPECT_EQ(hostString(), g["Description"].asString());
     }
 }
 
@@ -297,29 +307,33 @@ TEST_F(PortStandIn, TargetsOfTheDefaultHost)
 
 TEST_F(PortStandIn, AFaultyHostShowsWhatCanBeRead)
 {
-    // The first port's reply is an error; the second has members missing or
-    // of the wrong type; the third has texts far longer than their fields;
-    // the fourth is well.
+    // The first port's reply is an error; the second has members of the
+    // wrong type; the third has texts far longer than their fields; the
+    // fourth has no light, the fifth no supported speed a client could
+    // mistake for one; both name the first adapter's node in capitals.
     std::string longText(3000, 'x');
     std::string path = writeHost("faulty.json", R"({
       "faults": { "getPortByWwn": { "kind": "error", "count": 1 } },
       "adapters": [
-        { "hbaData": { "wwn": "20:00:00:00:c9:dd:00:00" },
+        { "hbaData": { "wwn": "20:00:00:00:c9:dd:00:00", "isMezz": false },
           "fcPorts": [
             { "wwn": "10:00:00:00:c9:dd:00:01" },
-            { "wwn": "10:00:00:00:c9:dd:00:02", "PortSymbolicName": 17,
-              "operatingSpeed": "fast", "supportedPortSpeeds": "16", "portTypeMOFValue": "x",
-              "beaconState": "on" },
+            { "wwn": "10:00:00:00:c9:dd:00:02",
+              "unchecked": { "PortSymbolicName": 17, "operatingSpeed": "fast",
+                             "supportedPortSpeeds": "16", "portTypeMOFValue": "x",
+                             "beaconState": "on" } },
             { "wwn": "10:00:00:00:c9:dd:00:03", "PortSymbolicName": ")" + longText + R"(",
               "nodeWwn": ")" + longText + R"(", "operatingSpeed": 16,
               "supportedPortSpeeds": [16] } ] },
         { "hbaData": { "wwn": "20:00:00:00:c9:ee:00:00" },
           "fcPorts": [ { "wwn": "10:00:00:00:c9:ee:00:01", "operatingSpeed": 99999,
-                         "supportedPortSpeeds": [32, 16] } ] } ] })");
+                         "supportedPortSpeeds": [32, 16], "nodeWwn": "20:00:00:00:C9:DD:00:00" },
+                       { "wwn": "10:00:00:00:c9:ee:00:02", "operatingSpeed": 99999,
+                         "supportedPortSpeeds": [99999], "nodeWwn": "20:00:00:00:C9:DD:00:00" } ] } ] })");
 
     Log log;
     std::vector<Props> got = enumerate("VESPERA_FCPort", path);
-    ASSERT_EQ(3u, got.size());
+    ASSERT_EQ(4u, got.size());
 
     EXPECT_EQ("10000000c9dd0002", got[0]["DeviceID"].asString());
     EXPECT_EQ("", got[0]["Caption"].asString());
@@ -334,8 +348,16 @@ TEST_F(PortStandIn, AFaultyHostShowsWhatCanBeRead)
     EXPECT_EQ("10000000c9ee0001", got[2]["DeviceID"].asString());
     EXPECT_EQ(0u, got[2]["Speed"].asUInt64());
     EXPECT_EQ(u64(32000000000ULL), got[2]["MaxSpeed"]);
+    EXPECT_EQ(0u, got[3]["Speed"].asUInt64());
+    EXPECT_EQ(u64(99999000000000ULL), got[3]["MaxSpeed"]);
 
     std::string text = log.text();
     EXPECT_EQ(1u, log.count("ERR", "libGetPortByWwn response is null or has error")) << text;
     EXPECT_GE(log.count("WARN", "PortSymbolicName is longer than 1027 characters"), 1u);
+
+    // The cut node and the first adapter's, once for three ports.
+    std::vector<Props> groups = enumerate("VESPERA_LogicalPortGroup", path);
+    ASSERT_EQ(2u, groups.size());
+    EXPECT_EQ("20000000c9dd0000", groups[0]["InstanceID"].asString());
+    EXPECT_EQ(std::string(23, 'x'), groups[1]["InstanceID"].asString());
 }

@@ -70,8 +70,7 @@ TEST(Array, InsertRemoveResizeFind)
     a.remove(5);
     EXPECT_EQ(a.size(), 1u);
 
-    a.resize(4, 7);
-    EXPECT_EQ(a[3], 7);
+    a.resize(4);
     a.resize(2);
     EXPECT_EQ(a.size(), 2u);
 
@@ -84,6 +83,29 @@ TEST(Array, InsertRemoveResizeFind)
     EXPECT_EQ(b[15], 7);
     b.append(b[0]);
     EXPECT_EQ(b[16], 0);
+}
+
+TEST(Array, GrowingPlainElementsZeroesThemWhateverTheValue)
+{
+    Array<uint32> a;
+    a.append(5);
+    a.resize(20, 7);    // across a reallocation
+    ASSERT_EQ(a.size(), 20u);
+    EXPECT_EQ(a[0], 5u);
+    for (size_t i = 1; i < a.size(); i++)
+        EXPECT_EQ(a[i], 0u) << i;
+
+    // A slot given up by shrinking comes back zeroed, not with its old bytes.
+    a[2] = 42;
+    a.resize(2);
+    a.resize(3, 9);
+    EXPECT_EQ(a[2], 0u);
+
+    int x = 1;
+    Array<int*> p;
+    p.resize(3, &x);
+    for (size_t i = 0; i < p.size(); i++)
+        EXPECT_EQ(p[i], nullptr);
 }
 
 TEST(Array, StringElementsAreCountedNotCopied)
