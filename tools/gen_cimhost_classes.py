@@ -124,16 +124,17 @@ def file_model(path):
 
 # ---------------------------------------------------------------------------
 
-def cmpi_type(type_, subscript, kind, flags):
-    if kind == 'reference':
-        t = 'CMPI_ref'
-    else:
-        t = CMPI_TYPES[type_]
-    return t + 'A' if subscript else t
+def cmpi_type(f):
+    t = 'CMPI_ref' if f.kind == 'reference' else CMPI_TYPES[f.type]
+    return t + 'A' if f.subscript else t
 
 
 def c_string(s):
     return gen_schema.c_string(s)
+
+
+def own_params(m):
+    return [p for p in m.params if p.name != 'return_value']
 
 
 def feature_flags(f, param=False):
@@ -155,10 +156,7 @@ def feature_flags(f, param=False):
 
 def entry(f, params_sym=None, nparams=0, param=False):
     ref = c_string(f.type) if f.kind == 'reference' else 'nullptr'
-    if f.kind == 'method':
-        type_ = CMPI_TYPES[f.type]
-    else:
-        type_ = cmpi_type(f.type, f.subscript, f.kind, f.flags)
+    type_ = CMPI_TYPES[f.type] if f.kind == 'method' else cmpi_type(f)
     return '    {%s, %s, %s, %s, %s, %d},' % (
         c_string(f.name), type_, feature_flags(f, param), ref,
         params_sym or 'nullptr', nparams)
@@ -175,9 +173,7 @@ def write(model, symbol, sources):
         own = [f for f, loc in zip(c.features, c.locals) if loc]
         sym = 'f_%s' % c.name
         for m in own:
-            if m.kind != 'method':
-                continue
-            params = [p for p in m.params if p.name != 'return_value']
+            params = own_params(m) if m.kind == 'method' else []
             if params:
                 L.append('const Feature_Desc p_%s_%s[] = {' % (c.name, m.name))
                 L += [entry(p, param=True) for p in params]
@@ -186,7 +182,7 @@ def write(model, symbol, sources):
             L.append('const Feature_Desc %s[] = {' % sym)
             for f in own:
                 if f.kind == 'method':
-                    n = len([p for p in f.params if p.name != 'return_value'])
+                    n = len(own_params(f))
                     L.append(entry(f, 'p_%s_%s' % (c.name, f.name) if n else None, n))
                 else:
                     L.append(entry(f))
