@@ -400,6 +400,7 @@ class Model:
         c.flags = flags
         c.restricted = restr
         index = {f.name.lower(): i for i, f in enumerate(c.features)}
+        declared = set()
         for f in d.features:
             names = [f.name] + [p.name for p in f.params]
             for n in names:
@@ -407,14 +408,25 @@ class Model:
                     raise GenError('%s: %s can\'t be a member name' % (f.where, n))
             key = f.name.lower()
             i = index.get(key)
-            if i is not None and c.locals[i]:
+            if key in declared:
                 raise GenError('%s: %s declares %s twice' % (f.where, c.name, f.name))
+            declared.add(key)
             if f.kind != 'reference' and key == 'return_value':
                 raise GenError('%s: reserved name %s' % (f.where, f.name))
             if i is None:
                 c.features.append(self._own_feature(c, f, None))
                 c.locals.append(1)
                 index[key] = len(c.features) - 1
+            elif c.name in self.module_names and not _has_qualifier(f, 'Override'):
+                # The module's MOF declares, as a new feature, one that the
+                # catalogue's parent already gives the class: a feature of a
+                # later schema, or of a parent that the catalogue moves, that
+                # a server holding only 2.26 Final lacks. The class keeps the
+                # parent's feature, which the declaration must restate.
+                own = self._own_feature(c, f, c.features[i])
+                if _feature_key(own) != _feature_key(c.features[i]):
+                    raise GenError('%s: %s.%s differs from the one of %s' % (
+                        f.where, c.name, f.name, c.features[i].origin))
             else:
                 c.features[i] = self._own_feature(c, f, c.features[i])
                 c.locals[i] = 1
@@ -428,6 +440,24 @@ class Model:
                 return True
             c = self.classes.get(c.super.lower()) if c.super else None
         return False
+
+
+def _has_qualifier(decl, name):
+    return any(q.name.lower() == name.lower() for q in decl.qualifiers)
+
+
+def _literal_key(lit):
+    if lit is None or lit.kind == 'null':
+        return None
+    if lit.kind == 'array':
+        return ('array', tuple(_literal_key(x) for x in lit.value))
+    return (lit.kind, lit.value)
+
+
+def _feature_key(f):
+    """What a resolved feature says, for telling two declarations apart."""
+    return (f.kind, f.name, f.type, f.subscript, f.flags, _literal_key(f.default),
+            tuple((p.kind, p.name, p.type, p.subscript, p.flags) for p in f.params))
 
 
 def _apply_additions(decl_by_name):

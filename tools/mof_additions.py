@@ -8,8 +8,11 @@ missing from the Final files. They are declared here, methods with their
 parameters in the schema's order, and inserted into the named class behind
 the named feature (None: at the end).
 
-A CIM server that holds only 2.26 Final never routes these methods to the
-module, so the module's own MOF does not repeat them.
+A CIM server that holds only 2.26 Final knows none of them, and refuses a
+property that its class doesn't declare; so schema/mof/vespera.mof declares
+each of them again in the VESPERA_ classes that inherit it, without
+Override. The generator checks that such a declaration says what the
+addition says.
 """
 
 ADDITIONS = [

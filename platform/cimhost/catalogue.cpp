@@ -1,14 +1,9 @@
 // Class knowledge for the host: the hierarchy (classPathIsA, isOfType, which
-// association providers to ask) and property and parameter types (typing the
-// arguments of `cm`). Our module describes its classes in static tables that
-// it reaches through `tessel_module`; we read those tables in place. The
-// records are mirrored here rather than included so that the host builds
-// without the runtime, and every walk is bounded, because a module is a
-// foreign library whose tables we only trust as far as we check them.
-
-#include <cstring>
-#include <dlfcn.h>
-#include <set>
+// association providers to ask), keys, property and parameter types (typing
+// the arguments of `cm`), and what an instance may hold. A CIM server knows
+// its classes from the MOF compiled into its repository, whatever a provider
+// module thinks of them; so do we, from a description that
+// tools/gen_cimhost_classes.py compiles from the same MOF.
 
 #include "internal.h"
 
@@ -20,151 +15,63 @@ namespace cimhost
 namespace
 {
 
-// The plain layout of the module's meta records (see runtime/Meta_Class.h).
-struct M_Head
+// Enough for every class and property a provider gets wrong, without letting
+// a runaway provider grow the list without end.
+const size_t MAX_REFUSALS = 256;
+
+Feature_Info feature_of(const Feature_Desc& d)
 {
-    uint32_t refs;
-    uint32_t flags;
-    const char* name;
-    void** meta_qualifiers;
-    size_t num_meta_qualifiers;
-};
-
-struct M_Feature : M_Head
-{
-};
-
-struct M_Property : M_Head
-{
-    uint16_t type;
-    int16_t subscript;
-    uint32_t offset;
-    const void* value;
-};
-
-struct M_Class;
-
-struct M_Reference : M_Head
-{
-    int16_t subscript;
-    const M_Class* meta_class;
-    uint32_t offset;
-};
-
-struct M_Method : M_Head
-{
-    M_Feature** meta_features;
-    size_t num_meta_features;
-    uint32_t size;
-    uint16_t return_type;
-};
-
-struct M_Repository;
-
-struct M_Class : M_Head
-{
-    M_Feature** meta_features;
-    size_t num_meta_features;
-    uint32_t size;
-    const uint8_t* locals;
-    const M_Class* super_meta_class;
-    size_t num_keys;
-    const M_Repository* meta_repository;
-};
-
-struct M_Repository
-{
-    const M_Class* const* meta_classes;
-    size_t num_meta_classes;
-};
-
-struct M_Registration
-{
-    const char* module_name;
-    const char* provider_name;
-    void* proc;
-    const M_Class* meta_class;
-    const M_Registration* next;
-};
-
-enum : uint32_t
-{
-    F_PROPERTY = 1u << 0,
-    F_REFERENCE = 1u << 1,
-    F_METHOD = 1u << 2,
-    F_ASSOCIATION = 1u << 7,
-    F_EMBEDDED_OBJECT = 1u << 12,
-    F_IN = 1u << 18,
-    F_INDICATION = 1u << 19,
-    F_KEY = 1u << 21,
-    F_OUT = 1u << 24,
-    F_STATIC = 1u << 27,
-    F_EMBEDDED_INSTANCE = 1u << 31,
-};
-
-const size_t MAX_ITEMS = 100000;
-const size_t MAX_NAME = 256;
-
-// The runtime's Type numbering, 0 to 13.
-const CMPIType type_codes[] = {
-    CMPI_boolean, CMPI_uint8,  CMPI_sint8,  CMPI_uint16, CMPI_sint16,  CMPI_uint32, CMPI_sint32,
-    CMPI_uint64,  CMPI_sint64, CMPI_real32, CMPI_real64, CMPI_char16, CMPI_string, CMPI_dateTime,
-};
-
-bool good_name(const char* s)
-{
-    return s && *s && strnlen(s, MAX_NAME) < MAX_NAME;
+    Feature_Info fi;
+    fi.name = d.name;
+    fi.type = d.type;
+    fi.key = (d.flags & FD_KEY) != 0;
+    fi.in = (d.flags & FD_IN) != 0;
+    fi.out = (d.flags & FD_OUT) != 0;
+    fi.embedded = (d.flags & FD_EMBEDDED) != 0;
+    fi.reference = (d.type & ~CMPI_ARRAY) == CMPI_ref;
+    if (d.ref_class)
+        fi.ref_class = d.ref_class;
+    return fi;
 }
 
-CMPIType cmpi_type(uint16_t t)
+Method_Info method_of(const Feature_Desc& d)
 {
-    return t < sizeof(type_codes) / sizeof(type_codes[0]) ? type_codes[t] : CMPIType(0);
+    Method_Info mi;
+    mi.name = d.name;
+    mi.return_type = d.type;
+    mi.is_static = (d.flags & FD_STATIC) != 0;
+    for (size_t i = 0; i < d.num_params; i++)
+        mi.params.push_back(feature_of(d.params[i]));
+    return mi;
 }
 
-bool read_feature(const M_Feature* mf, Feature_Info& fi)
+template <class T>
+void put(std::vector<T>& items, const T& item)
 {
-    if (!mf || !good_name(mf->name))
-        return false;
-    fi.name = mf->name;
-    fi.key = (mf->flags & F_KEY) != 0;
-    fi.in = (mf->flags & F_IN) != 0;
-    fi.out = (mf->flags & F_OUT) != 0;
-    if (mf->flags & F_PROPERTY)
-    {
-        const M_Property* mp = static_cast<const M_Property*>(static_cast<const M_Head*>(mf));
-        CMPIType t = cmpi_type(mp->type);
-        if (!t)
-            return false;
-        fi.type = mp->subscript ? CMPIType(t | CMPI_ARRAY) : t;
+    for (T& x : items)
+        if (name_eq(x.name, item.name))
+        {
+            x = item;
+            return;
+        }
+    items.push_back(item);
+}
+
+std::string shown(CMPIType t)
+{
+    std::string name = type_name(t);
+    return name.empty() ? "type " + std::to_string(t) : name;
+}
+
+// Whether a value of `given` type fits a property declared as `f`.
+bool fits(const Feature_Info& f, CMPIType given)
+{
+    if (given == f.type)
         return true;
-    }
-    if (mf->flags & F_REFERENCE)
-    {
-        const M_Reference* mr = static_cast<const M_Reference*>(static_cast<const M_Head*>(mf));
-        bool embedded = (mf->flags & (F_EMBEDDED_OBJECT | F_EMBEDDED_INSTANCE)) != 0;
-        CMPIType t = embedded ? CMPIType(CMPI_instance) : CMPIType(CMPI_ref);
-        fi.type = mr->subscript ? CMPIType(t | CMPI_ARRAY) : t;
-        fi.reference = true;
-        if (mr->meta_class && good_name(mr->meta_class->name))
-            fi.ref_class = mr->meta_class->name;
-        return true;
-    }
-    return false;
-}
-
-void read_method(const M_Method* mm, Method_Info& mi)
-{
-    mi.name = mm->name;
-    mi.return_type = cmpi_type(mm->return_type);
-    mi.is_static = (mm->flags & F_STATIC) != 0;
-    if (!mm->meta_features || mm->num_meta_features > MAX_ITEMS)
-        return;
-    for (size_t i = 0; i < mm->num_meta_features; i++)
-    {
-        Feature_Info fi;
-        if (read_feature(mm->meta_features[i], fi) && !name_eq(fi.name, "return_value"))
-            mi.params.push_back(fi);
-    }
+    // An embedded instance or object is declared a string and travels as an
+    // instance.
+    CMPIType array = f.type & CMPI_ARRAY;
+    return f.embedded && given == CMPIType(CMPI_instance | array);
 }
 
 } // namespace
@@ -185,73 +92,33 @@ const Method_Info* Class_Info::method(const std::string& n) const
     return nullptr;
 }
 
-bool Catalogue::load(void* dl_handle, std::string& err)
+void Catalogue::load(const Class_Table& table)
 {
-    typedef const M_Registration* (*Module_Fn)();
-    void* sym = dlsym(dl_handle, "tessel_module");
-    if (!sym)
+    for (size_t i = 0; i < table.num_classes; i++)
     {
-        err = "module has no tessel_module";
-        return false;
-    }
-    Module_Fn fn = reinterpret_cast<Module_Fn>(sym);
-    std::set<const M_Repository*> repositories;
-    std::set<const M_Class*> seen;
-    std::vector<const M_Class*> pending;
-    size_t n = 0;
-    for (const M_Registration* r = fn(); r && n < MAX_ITEMS; r = r->next, n++)
-    {
-        if (!r->meta_class)
-            continue;
-        pending.push_back(r->meta_class);
-        if (r->meta_class->meta_repository)
-            repositories.insert(r->meta_class->meta_repository);
-    }
-    for (const M_Repository* mr : repositories)
-        if (mr->meta_classes && mr->num_meta_classes < MAX_ITEMS)
-            for (size_t i = 0; i < mr->num_meta_classes; i++)
-                pending.push_back(mr->meta_classes[i]);
-    while (!pending.empty())
-    {
-        const M_Class* mc = pending.back();
-        pending.pop_back();
-        if (!mc || seen.count(mc) || seen.size() > MAX_ITEMS || !good_name(mc->name))
-            continue;
-        seen.insert(mc);
+        const Class_Desc& cd = table.classes[i];
+        const Class_Info* parent = cd.super ? find(cd.super) : nullptr;
         Class_Info ci;
-        ci.name = mc->name;
-        if (mc->super_meta_class && good_name(mc->super_meta_class->name))
+        if (parent)
         {
-            ci.super = mc->super_meta_class->name;
-            pending.push_back(mc->super_meta_class);
+            ci = *parent;
+            ci.super = parent->name;
         }
-        ci.association = (mc->flags & F_ASSOCIATION) != 0;
-        ci.indication = (mc->flags & F_INDICATION) != 0;
-        if (mc->meta_features && mc->num_meta_features < MAX_ITEMS)
+        ci.name = cd.name;
+        ci.declared = true;
+        // Kinds pass to subclasses, as the qualifiers do.
+        ci.association = ci.association || (cd.kind & CD_ASSOCIATION);
+        ci.indication = ci.indication || (cd.kind & CD_INDICATION);
+        for (size_t k = 0; k < cd.num_features; k++)
         {
-            for (size_t i = 0; i < mc->num_meta_features; i++)
-            {
-                const M_Feature* mf = mc->meta_features[i];
-                if (!mf || !good_name(mf->name))
-                    continue;
-                if (mf->flags & F_METHOD)
-                {
-                    Method_Info mi;
-                    read_method(static_cast<const M_Method*>(static_cast<const M_Head*>(mf)), mi);
-                    ci.methods.push_back(mi);
-                    continue;
-                }
-                Feature_Info fi;
-                if (read_feature(mf, fi))
-                    ci.features.push_back(fi);
-            }
+            const Feature_Desc& fd = cd.features[k];
+            if (fd.flags & FD_METHOD)
+                put(ci.methods, method_of(fd));
+            else
+                put(ci.features, feature_of(fd));
         }
         classes[lower(ci.name)] = ci;
     }
-    tables = !classes.empty();
-    if (!tables)
-        err = "tessel_module gave no classes";
-    return tables;
 }
 
 void Catalogue::add_name_only(const std::string& name, bool association, bool indication)
@@ -285,6 +152,50 @@ bool Catalogue::is_a(const std::string& cls, const std::string& ancestor) const
         cur = ci->super;
     }
     return false;
+}
+
+CMPIrc Catalogue::check_property(const std::string& cls, const std::string& name,
+                                 CMPIType type) const
+{
+    const Class_Info* ci = find(cls);
+    if (!ci || !ci->declared)
+        return CMPI_RC_OK;
+    const Feature_Info* f = ci->feature(name);
+    std::string why;
+    CMPIrc rc = CMPI_RC_OK;
+    if (!f)
+    {
+        rc = CMPI_RC_ERR_NO_SUCH_PROPERTY;
+        why = "the class doesn't declare it";
+    }
+    else if (type != CMPI_null && !fits(*f, type))
+    {
+        rc = CMPI_RC_ERR_TYPE_MISMATCH;
+        why = "declared " + shown(f->type) + ", given " + shown(type);
+    }
+    if (rc == CMPI_RC_OK)
+        return rc;
+    std::string line =
+        "Property " + name + " not set on the created instance of class " + ci->name + ": " + why;
+    std::lock_guard<std::mutex> g(refusal_mutex);
+    bool known = false;
+    for (const std::string& r : refusals)
+        known = known || r == line;
+    if (!known && refusals.size() < MAX_REFUSALS)
+        refusals.push_back(line);
+    return rc;
+}
+
+std::vector<std::string> Catalogue::refused_properties() const
+{
+    std::lock_guard<std::mutex> g(refusal_mutex);
+    return refusals;
+}
+
+void Catalogue::clear_refused_properties()
+{
+    std::lock_guard<std::mutex> g(refusal_mutex);
+    refusals.clear();
 }
 
 } // namespace cimhost

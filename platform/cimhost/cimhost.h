@@ -6,7 +6,10 @@
 // It loads a CMPI provider module with dlopen, learns from an SFCB-style .reg
 // file which provider serves which class, and serves the operations a WBEM
 // client would send (enumerate, get, associations, methods, indications)
-// through the providers' MI tables, with a complete broker behind them.
+// through the providers' MI tables, with a complete broker behind them. Like
+// a CIM server it knows the classes from their MOF (compiled in, see
+// Options::classes), and refuses a property that a provider sets on an
+// instance if the class doesn't declare it.
 // Tests drive a module through a Host; the `cimhost` command is a thin
 // wrapper around the same calls.
 //
@@ -43,6 +46,7 @@ namespace cimhost
 
 struct Instance;
 struct Object_Path;
+struct Class_Table;
 
 // One CIM value. `type` is the CMPI type code; arrays have the CMPI_ARRAY bit
 // and their elements in `elements`. Numbers, boolean and char16 live in `num`
@@ -153,6 +157,11 @@ struct Options
     bool interop_empty = false;
     // The "CMPIPrincipal" entry of every context.
     std::string principal = "cimhost";
+    // The classes the host knows, as a server knows those compiled into its
+    // repository; null for the built-in ones of the module's namespace (the
+    // DMTF CIM schema 2.26 Final and schema/mof/vespera.mof). A class that
+    // only the .reg file names is known by name alone.
+    const Class_Table* classes = nullptr;
 };
 
 // Path text parsing. Accepts "[//host/]ns:Class[.key=value,...]" and
@@ -249,7 +258,7 @@ public:
     // Returns how many refused (CMPI_RC_DO_NOT_UNLOAD / NEVER_UNLOAD).
     int cleanup(bool terminating);
 
-    // Class knowledge, from the module's tables when it has them.
+    // Class knowledge, from the classes of the options.
     // The CIM type of a property or method parameter (CMPI code with the
     // array bit), 0 if unknown.
     CMPIType property_type(const std::string& class_name, const std::string& property) const;
@@ -257,14 +266,22 @@ public:
                             const std::string& parameter) const;
     bool knows_class(const std::string& class_name) const;
     bool class_is_a(const std::string& class_name, const std::string& ancestor) const;
-    // Types the keys of a parsed path by the class tables (references,
+    // Types the keys of a parsed path by the class (references,
     // narrower integers), so that it matches what a provider expects.
     void type_keys(Object_Path& path) const;
+
+    // Properties that a provider set on an instance and the host refused,
+    // as a server refuses them: the class doesn't declare the property
+    // (CMPI_RC_ERR_NO_SUCH_PROPERTY) or declares another type
+    // (CMPI_RC_ERR_TYPE_MISMATCH). One line for each class, property and
+    // reason, oldest first, until cleared.
+    std::vector<std::string> refused_properties() const;
+    void clear_refused_properties();
 
     // Reading user input as the command line does. parse_object_path()
     // parses, checks that the class is known and types the keys;
     // parse_argument() reads "NAME=TYPE:VALUE", or "NAME=VALUE" with the type
-    // of the method's parameter from the class tables. False with a one-line
+    // of the method's parameter from its class. False with a one-line
     // reason for unknown classes and untyped or mistyped values.
     bool parse_object_path(const std::string& text, Object_Path& path, std::string& err) const;
     bool parse_argument(const Object_Path& path, const std::string& method,

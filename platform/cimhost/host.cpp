@@ -1090,8 +1090,7 @@ Host_Impl::Host_Impl(const Options& o) : opts(o)
         err = "can't load " + opts.module_path + ": " + (e ? e : "unknown error");
         return;
     }
-    std::string cat_err;
-    cat.load(dl, cat_err);
+    cat.load(opts.classes ? *opts.classes : vespera_classes);
     for (const Registration_Entry& e : regs)
         cat.add_name_only(e.class_name, (e.kinds & MI_ASSOCIATION) != 0,
                           (e.kinds & MI_INDICATION) != 0);
@@ -1450,7 +1449,7 @@ CMPIrc Host_Impl::do_assoc(Assoc_Op op, Object_Path path, const std::string& ass
             continue;
         }
         const Class_Info* ci = cat.find(e.class_name);
-        bool refers = !cat.has_tables() || !ci;
+        bool refers = !ci || !ci->declared;
         for (size_t i = 0; ci && !refers && i < ci->features.size(); i++)
         {
             const Feature_Info& f = ci->features[i];
@@ -2021,6 +2020,16 @@ bool Host::knows_class(const std::string& class_name) const
 bool Host::class_is_a(const std::string& class_name, const std::string& ancestor) const
 {
     return impl->cat.is_a(class_name, ancestor);
+}
+
+std::vector<std::string> Host::refused_properties() const
+{
+    return impl->cat.refused_properties();
+}
+
+void Host::clear_refused_properties()
+{
+    impl->cat.clear_refused_properties();
 }
 
 void Host::type_keys(Object_Path& path) const

@@ -15,6 +15,18 @@
 #include "cimhost.h"
 #include "internal.h"
 
+#ifdef CIMHOST_CLASSES
+// A build of the command for another namespace's classes (the tests' own
+// module) names them here.
+namespace OLMA
+{
+namespace cimhost
+{
+extern const Class_Table CIMHOST_CLASSES;
+}
+} // namespace OLMA
+#endif
+
 using namespace OLMA::cimhost;
 
 namespace
@@ -48,7 +60,7 @@ const char usage_text[] =
     "                        invoke a method; VALUE is TYPE:TEXT (TYPE one of boolean,\n"
     "                        uint8..uint64, sint8..sint64, real32, real64, char16, string,\n"
     "                        datetime, ref; TYPE[] for a comma-separated array) or plain\n"
-    "                        TEXT when the module's class tables give the parameter's type\n"
+    "                        TEXT when the method declares the parameter's type\n"
     "      cimhost cm 'root/vespera:VESPERA_FCPort.DeviceID=\"x\"' RequestStateChange RequestedState=uint16:3\n"
     "      cimhost cm 'root/vespera:VESPERA_AgentService.Name=\"a\"' executeMethod "
     "'request=string:{\"method\":\"discovery.getAdapters\",\"id\":1}'\n"
@@ -391,6 +403,14 @@ int listen(Host& host, const Args& a)
     return 0;
 }
 
+// A server logs what it refused a provider; the provider's results just
+// lack it.
+void warn_refusals(const Host& host)
+{
+    for (const std::string& line : host.refused_properties())
+        std::cerr << "cimhost: warning: " << line << "\n";
+}
+
 int run(int argc, char** argv)
 {
     for (int i = 1; i < argc; i++)
@@ -413,6 +433,9 @@ int run(int argc, char** argv)
     opts.module_path = a.module;
     opts.reg_path = a.reg;
     opts.interop = a.interop;
+#ifdef CIMHOST_CLASSES
+    opts.classes = &CIMHOST_CLASSES;
+#endif
     Host host(opts);
     if (!host.ok())
     {
@@ -420,7 +443,11 @@ int run(int argc, char** argv)
         return 1;
     }
     if (a.verb == "listen")
-        return listen(host, a);
+    {
+        int status = listen(host, a);
+        warn_refusals(host);
+        return status;
+    }
 
     const std::vector<std::string>* props = a.has_props ? &a.props : nullptr;
     Result r;
@@ -462,6 +489,7 @@ int run(int argc, char** argv)
         std::cout << Json::StyledWriter().write(json_result(r, v));
     else if (r.ok())
         print_text(r, v);
+    warn_refusals(host);
     if (!r.ok())
     {
         std::cerr << "cimhost: " << rc_name(r.rc) << (r.message.empty() ? "" : ": ")

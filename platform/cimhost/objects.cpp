@@ -352,6 +352,12 @@ CMPIStatus inst_set(const CMPIInstance* i, const char* name, const CMPIValue* v,
     CMPIrc rc = from_cmpi(v, t, val);
     if (rc != CMPI_RC_OK)
         return status(rc);
+    // A server takes only what the class in its repository declares, and
+    // with the declared type, property list or not.
+    const Catalogue* cat = host_catalogue();
+    rc = cat ? cat->check_property(o->data.class_name, name, val.type) : CMPI_RC_OK;
+    if (rc != CMPI_RC_OK)
+        return status(rc);
     // A filtered-out property is dropped silently, as the client asked for
     // fewer properties, not for an error.
     if (passes_filter(o, name))

@@ -8,8 +8,19 @@
 #include <gtest/gtest.h>
 
 #include "cimhost.h"
+#include "cmpimacs.h"
+#include "internal.h"
 
 using namespace OLMA::cimhost;
+
+namespace OLMA
+{
+namespace cimhost
+{
+// testprov/testprov_classes.cpp, from testprov.mof.
+extern const Class_Table testprov_classes;
+} // namespace cimhost
+} // namespace OLMA
 
 namespace
 {
@@ -63,6 +74,7 @@ protected:
         Options o;
         o.module_path = TESTPROV_MODULE;
         o.reg_path = TESTPROV_REG;
+        o.classes = &testprov_classes;
         return o;
     }
 
@@ -413,10 +425,44 @@ TEST_F(CimhostHost, ObjectsOfARequestAreFreedAndCleanupForgetsMIs)
     EXPECT_EQ(creates + 1, counters->creates);
 }
 
-TEST(CimhostPlain, WithoutClassTablesTheRegistrationFileIsAllItKnows)
+TEST_F(CimhostHost, InstancesTakeOnlyWhatTheClassDeclares)
 {
+    const CMPIBroker* b = host->broker();
+    CMPIObjectPath* op = CMNewObjectPath(b, "root/test", "Test_Widget", nullptr);
+    CMPIInstance* ci = CMNewInstance(b, op, nullptr);
+    ASSERT_NE(nullptr, ci);
+    CMPIUint16 size = 7;
+    CMPIUint32 wide = 8;
+    EXPECT_EQ(CMPI_RC_OK, CMSetProperty(ci, "size", &size, CMPI_uint16).rc);
+    EXPECT_EQ(CMPI_RC_OK, CMSetProperty(ci, "Caption", "inherited", CMPI_chars).rc);
+    EXPECT_EQ(CMPI_RC_OK, CMSetProperty(ci, "Note", nullptr, CMPI_null).rc);
+    EXPECT_EQ(CMPI_RC_ERR_NO_SUCH_PROPERTY, CMSetProperty(ci, "Colour", "red", CMPI_chars).rc);
+    EXPECT_EQ(CMPI_RC_ERR_TYPE_MISMATCH, CMSetProperty(ci, "Size", &wide, CMPI_uint32).rc);
+    EXPECT_EQ(CMPI_RC_ERR_TYPE_MISMATCH, CMSetProperty(ci, "Tags", "one", CMPI_chars).rc);
+
+    // What was refused isn't there, and what was set keeps its value.
+    EXPECT_EQ(3u, CMGetPropertyCount(ci, nullptr));
+    EXPECT_EQ(7, CMGetProperty(ci, "Size", nullptr).value.uint16);
+    std::vector<std::string> refused = host->refused_properties();
+    ASSERT_EQ(3u, refused.size());
+    EXPECT_EQ("Property Colour not set on the created instance of class Test_Widget: "
+              "the class doesn't declare it", refused[0]);
+    EXPECT_NE(std::string::npos, refused[1].find("declared uint16, given uint32")) << refused[1];
+    EXPECT_NE(std::string::npos, refused[2].find("declared string[], given string")) << refused[2];
+    // The same refusal again is no new line.
+    CMSetProperty(ci, "Colour", "blue", CMPI_chars);
+    EXPECT_EQ(3u, host->refused_properties().size());
+    host->clear_refused_properties();
+    EXPECT_TRUE(host->refused_properties().empty());
+    CMRelease(ci);
+    CMRelease(op);
+}
+
+TEST(CimhostPlain, ClassesOutsideTheMofAreKnownByTheirRegistrationAlone)
+{
+    // The built-in classes are the module's: the test module's are in none.
     Options o;
-    o.module_path = TESTPROV_PLAIN_MODULE;
+    o.module_path = TESTPROV_MODULE;
     o.reg_path = TESTPROV_REG;
     Host h(o);
     ASSERT_TRUE(h.ok()) << h.error();
@@ -424,7 +470,11 @@ TEST(CimhostPlain, WithoutClassTablesTheRegistrationFileIsAllItKnows)
     EXPECT_FALSE(h.knows_class("Test_Base"));
     EXPECT_EQ(0, h.parameter_type("Test_Widget", "Double", "X"));
     EXPECT_EQ(CMPI_RC_ERR_INVALID_CLASS, h.ei(path_of("root/test:Test_Base")).rc);
-    EXPECT_EQ(3u, h.ei(path_of("root/test:Test_Widget")).instances.size());
+    // Nor is anything that a provider sets checked against a class.
+    Result widgets = h.ei(path_of("root/test:Test_Widget"));
+    ASSERT_EQ(3u, widgets.instances.size());
+    EXPECT_EQ("1", widgets.instances[0].get_text("Size"));
+    EXPECT_TRUE(h.refused_properties().empty());
     // With nothing to tell which associations refer to a widget, every
     // association provider of the namespace is asked.
     Result r = h.an(path_of("root/test:Test_Widget.Name=\"a\""));

@@ -9,6 +9,7 @@ import unittest
 sys.dont_write_bytecode = True
 sys.path.insert(0, os.path.join(os.path.dirname(os.path.abspath(__file__)), '..', '..', 'tools'))
 
+import gen_cimhost_classes  # noqa: E402
 import gen_schema  # noqa: E402
 import mof  # noqa: E402
 
@@ -157,6 +158,53 @@ class ModelTest(unittest.TestCase):
         for text in bad:
             with self.assertRaises(gen_schema.GenError, msg=text):
                 model(BASE + text)
+
+
+class ServerDeclarationTest(unittest.TestCase):
+    """A module class may declare, without Override, a feature that the
+    catalogue's parent has but a 2.26 Final server's parent lacks."""
+
+    def test_the_tables_keep_the_parents_feature_if_it_says_the_same(self):
+        m = model(BASE + '''
+            class VESPERA_B : CIM_B {
+                [Experimental, Write] uint16 State = 5;
+                uint32 Reset([In, Required(false)] uint16 How, [In(false), Out] CIM_A REF Job);
+            };''', ['VESPERA_B'])
+        self.assertEqual([0] * 5, m.classes['vespera_b'].locals)
+        state, _ = feature(m, 'VESPERA_B', 'State')
+        self.assertEqual('CIM_A', state.origin)
+        for other in ['uint16 State = 6;', '[Write] uint16 State = 5;',
+                      'uint32 Reset([In, Out] uint16 How, [In(false), Out] CIM_A REF Job);',
+                      'uint32 Reset([In, Required(false)] uint16 How);']:
+            with self.assertRaisesRegex(gen_schema.GenError, 'differs', msg=other):
+                model(BASE + 'class VESPERA_B : CIM_B { %s };' % other, ['VESPERA_B'])
+
+
+class ServerTest(unittest.TestCase):
+    def compile(self, text):
+        decls, classes = mof.parse_text(QUALIFIERS + BASE + text, 'x.mof')
+        return gen_cimhost_classes.compile_mof(decls, classes)
+
+    def test_a_server_refuses_what_the_tables_would_take(self):
+        self.compile('class X_B : CIM_B { [Override("Note")] string Note; string Own; };')
+        for text, why in [
+                ('class X_B : CIM_B { [Override("Nothing")] string Nothing; };', 'overrides nothing'),
+                ('class X_B : CIM_B { [Override("Id")] string Note; };', 'names'),
+                ('class X_B : CIM_B { string Note; };', 'without Override'),
+                ('class X_B : CIM_B { [EmbeddedInstance("CIM_Z")] string E; };', 'not a class')]:
+            with self.assertRaisesRegex(gen_cimhost_classes.ServerError, why, msg=text):
+                self.compile(text)
+
+    def test_description_lists_own_features_with_their_cmpi_types(self):
+        text = gen_cimhost_classes.write(
+            self.compile('[Association] class X_L : CIM_L { [Override("Left")] CIM_B REF Left; };'),
+            'x_classes', 'x.mof')
+        self.assertTrue(text.startswith(gen_cimhost_classes.MARKER % 'x.mof' + '\n'))
+        self.assertIn('{"Id", CMPI_string, FD_KEY, nullptr, nullptr, 0},', text)
+        self.assertIn('{"Job", CMPI_ref, FD_OUT, "CIM_A", nullptr, 0},', text)
+        self.assertIn('{"Reset", CMPI_uint32, FD_METHOD, nullptr, p_CIM_A_Reset, 2},', text)
+        self.assertIn('{"X_L", "CIM_L", CD_ASSOCIATION, f_X_L, 1},', text)
+        self.assertIn('extern const Class_Table x_classes;', text)
 
 
 class WriterTest(unittest.TestCase):
