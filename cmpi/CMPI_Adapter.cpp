@@ -577,7 +577,6 @@ namespace enum_instances
 
         CMPIInstance* ci = 0;
         data->rc = make_cmpi_instance(data->broker, instance, ns, path, data->properties, ci);
-        CMRelease(path);
 
         if (data->rc != 0)
             return false;
@@ -1110,7 +1109,6 @@ namespace references
         CMPIInstance* ci = 0;
         data->rc = make_cmpi_instance(data->broker, instance, data->name_space, path,
             data->properties, ci);
-        CMRelease(path);
 
         if (data->rc != 0)
             return false;
@@ -1340,10 +1338,13 @@ static bool _indication_proc(Instance* instance, void* client_data)
 
     for (size_t i = 0; i < adapter->name_spaces.size(); i++)
     {
+        // No request ends on this thread to free what the conversion makes:
+        // once the server has the indication, it goes.
+        CMPI_Made made;
         const char* ns = adapter->name_spaces[i].name_space.c_str();
         CMPIInstance* ci = 0;
 
-        if (make_cmpi_instance(adapter->broker, instance, ns, 0, 0, ci) != 0)
+        if (make_cmpi_instance(adapter->broker, instance, ns, 0, 0, ci, &made) != 0)
             continue;
 
         CBDeliverIndication(top->broker, top->context, ns, ci);

@@ -36,8 +36,9 @@ static int _convert(const Meta_Repository* mr, const CMPIBroker* broker,
 //
 
 CMPIInstance_Container::CMPIInstance_Container(const Meta_Repository* mr,
-    const CMPIBroker* broker_, const char* name_space_, const CMPIInstance* instance_)
-    : Container(mr), broker(broker_), name_space(name_space_), instance(instance_)
+    const CMPIBroker* broker_, const char* name_space_, const CMPIInstance* instance_,
+    CMPI_Made* made_)
+    : Container(mr), broker(broker_), name_space(name_space_), instance(instance_), made(made_)
 {
 }
 
@@ -115,14 +116,13 @@ int CMPIInstance_Container::set_value(const char* name, const Value& value, uint
 {
     CMPIData data;
 
-    if (_to_cmpi_data(meta_repository, broker, name_space, value, flags, data) != 0)
+    if (_to_cmpi_data(meta_repository, broker, name_space, value, flags, data, made) != 0)
     {
         TLOG(LL_WARN, "_to_cmpi_data() failed: feature=%s", name);
         return -1;
     }
 
     CMPIStatus st = CMSetProperty(instance, name, &data.value, data.type);
-    _release_cmpi_data(data);
 
     if (st.rc != CMPI_RC_OK)
     {
@@ -138,8 +138,10 @@ int CMPIInstance_Container::set_value(const char* name, const Value& value, uint
 //
 
 CMPIObjectPath_Container::CMPIObjectPath_Container(const Meta_Repository* mr,
-    const CMPIBroker* broker_, const char* name_space_, const CMPIObjectPath* object_path_)
-    : Container(mr), broker(broker_), name_space(name_space_), object_path(object_path_)
+    const CMPIBroker* broker_, const char* name_space_, const CMPIObjectPath* object_path_,
+    CMPI_Made* made_)
+    : Container(mr), broker(broker_), name_space(name_space_), object_path(object_path_),
+      made(made_)
 {
 }
 
@@ -253,14 +255,13 @@ int CMPIObjectPath_Container::set_value(const char* name, const Value& value, ui
 {
     CMPIData data;
 
-    if (_to_cmpi_data(meta_repository, broker, name_space, value, flags, data) != 0)
+    if (_to_cmpi_data(meta_repository, broker, name_space, value, flags, data, made) != 0)
     {
         TLOG(LL_WARN, "_to_cmpi_data() failed: feature=%s", name);
         return -1;
     }
 
     CMPIStatus st = CMAddKey((CMPIObjectPath*)object_path, name, &data.value, data.type);
-    _release_cmpi_data(data);
 
     if (st.rc != CMPI_RC_OK)
     {
@@ -276,8 +277,10 @@ int CMPIObjectPath_Container::set_value(const char* name, const Value& value, ui
 //
 
 CMPIArgs_Container::CMPIArgs_Container(const Meta_Repository* mr,
-    const CMPIBroker* broker_, const char* name_space_, const CMPIArgs* args_)
-    : Container(mr), broker(broker_), name_space(name_space_), args(args_), return_type(0)
+    const CMPIBroker* broker_, const char* name_space_, const CMPIArgs* args_,
+    CMPI_Made* made_)
+    : Container(mr), broker(broker_), name_space(name_space_), args(args_), made(made_),
+      return_type(0), upcall(false)
 {
     memset(&return_value, 0, sizeof(return_value));
 }
@@ -336,6 +339,9 @@ int CMPIArgs_Container::get_value(size_t index, Value::Type type, Value& value)
         return -1;
     }
 
+    if (upcall)
+        _read_by_pointer(data);
+
     if (_convert(meta_repository, broker, name_space, data, value) != 0)
         return -1;
 
@@ -353,7 +359,7 @@ int CMPIArgs_Container::set_value(const char* name, const Value& value, uint32 f
 {
     CMPIData data;
 
-    if (_to_cmpi_data(meta_repository, broker, name_space, value, flags, data) != 0)
+    if (_to_cmpi_data(meta_repository, broker, name_space, value, flags, data, made) != 0)
     {
         TLOG(LL_WARN, "_to_cmpi_data() failed: feature=%s", name);
         return -1;
@@ -369,7 +375,6 @@ int CMPIArgs_Container::set_value(const char* name, const Value& value, uint32 f
     }
 
     CMPIStatus st = CMAddArg(args, name, &data.value, data.type);
-    _release_cmpi_data(data);
 
     if (st.rc != CMPI_RC_OK)
     {

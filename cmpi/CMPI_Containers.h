@@ -10,12 +10,18 @@
 namespace OLMA
 {
 
+class CMPI_Made;
+
+// What set_value makes through the broker stays with the object set, which
+// keeps its pointer: it goes to made if there is one, else to the broker.
+
 class CMPIInstance_Container : public Container
 {
 public:
 
     CMPIInstance_Container(const Meta_Repository* meta_repository,
-        const CMPIBroker* broker, const char* name_space, const CMPIInstance* instance);
+        const CMPIBroker* broker, const char* name_space, const CMPIInstance* instance,
+        CMPI_Made* made = 0);
 
     virtual ~CMPIInstance_Container();
 
@@ -30,6 +36,7 @@ public:
     const CMPIBroker* broker;
     const char* name_space;
     const CMPIInstance* instance;
+    CMPI_Made* made;
 };
 
 class CMPIObjectPath_Container : public Container
@@ -37,7 +44,8 @@ class CMPIObjectPath_Container : public Container
 public:
 
     CMPIObjectPath_Container(const Meta_Repository* meta_repository,
-        const CMPIBroker* broker, const char* name_space, const CMPIObjectPath* object_path);
+        const CMPIBroker* broker, const char* name_space, const CMPIObjectPath* object_path,
+        CMPI_Made* made = 0);
 
     virtual ~CMPIObjectPath_Container();
 
@@ -54,6 +62,7 @@ public:
     const CMPIBroker* broker;
     const char* name_space;
     const CMPIObjectPath* object_path;
+    CMPI_Made* made;
 };
 
 class CMPIArgs_Container : public Container
@@ -61,7 +70,8 @@ class CMPIArgs_Container : public Container
 public:
 
     CMPIArgs_Container(const Meta_Repository* meta_repository,
-        const CMPIBroker* broker, const char* name_space, const CMPIArgs* args);
+        const CMPIBroker* broker, const char* name_space, const CMPIArgs* args,
+        CMPI_Made* made = 0);
 
     virtual ~CMPIArgs_Container();
 
@@ -78,8 +88,12 @@ public:
     const CMPIBroker* broker;
     const char* name_space;
     const CMPIArgs* args;
+    CMPI_Made* made;
     CMPIType return_type;
     CMPIValue return_value;
+    // Out arguments of an up-call: read by their pointers (see
+    // _read_by_pointer).
+    bool upcall;
 };
 
 } // namespace OLMA

@@ -8,12 +8,15 @@
 namespace OLMA
 {
 
-// An enumeration of the CIM server, read one instance ahead.
+// An enumeration of the CIM server, read one instance ahead. The path that
+// asked for it and what went into the path go with it.
 struct Instance_Enumerator_Rep
 {
     CMPIEnumeration* enumeration;
     const Meta_Class* meta_class;
     Ref<Instance> instance;
+    CMPIObjectPath* path;
+    CMPI_Made made;
 };
 
 // The context that decides: the top of this thread's stack.
@@ -61,6 +64,7 @@ static Instance* _next_instance(CMPIEnumeration* enumeration, const Meta_Class* 
 
     CMPIStatus st = { CMPI_RC_OK, 0 };
     CMPIData data = CMGetNext(enumeration, &st);
+    _read_by_pointer(data);
 
     if (st.rc != CMPI_RC_OK || data.type != CMPI_instance || !data.value.inst ||
         (data.state & CMPI_nullValue))
@@ -75,6 +79,8 @@ static Instance* _next_instance(CMPIEnumeration* enumeration, const Meta_Class* 
     return instance;
 }
 
+// Up-calls release what they made for the call once it has returned and its
+// answer is read, so that a long-lived thread doesn't gather them.
 Instance_Enumerator_Rep* CMPI_Thread_Context::instance_enumerator_create(
     const char* name_space, const Instance* model)
 {
@@ -83,28 +89,35 @@ Instance_Enumerator_Rep* CMPI_Thread_Context::instance_enumerator_create(
     if (!name_space || !model || !top || !top->broker || !top->context)
         return 0;
 
-    CMPIObjectPath* path = 0;
+    Instance_Enumerator_Rep* rep = new Instance_Enumerator_Rep;
+    rep->enumeration = 0;
+    rep->meta_class = model->meta_class;
+    rep->path = 0;
 
-    if (make_cmpi_object_path(top->broker, model, name_space, path) != 0)
+    if (make_cmpi_object_path(top->broker, model, name_space, rep->path, &rep->made) != 0)
+    {
+        delete rep;
         return 0;
+    }
 
     CMPIStatus st = { CMPI_RC_OK, 0 };
-    CMPIEnumeration* e = CBEnumInstances(top->broker, top->context, path, 0, &st);
-    CMRelease(path);
+    rep->enumeration = CBEnumInstances(top->broker, top->context, rep->path, 0, &st);
 
-    if (st.rc != CMPI_RC_OK || !e)
+    if (st.rc != CMPI_RC_OK || !rep->enumeration)
+    {
+        instance_enumerator_destroy(rep);
         return 0;
+    }
 
-    Instance_Enumerator_Rep* rep = new Instance_Enumerator_Rep;
-    rep->enumeration = e;
-    rep->meta_class = model->meta_class;
-    rep->instance.reset(_next_instance(e, rep->meta_class));
+    rep->instance.reset(_next_instance(rep->enumeration, rep->meta_class));
     return rep;
 }
 
 void CMPI_Thread_Context::instance_enumerator_destroy(Instance_Enumerator_Rep* rep)
 {
     // The CMPIEnumeration belongs to the server.
+    if (rep && rep->path)
+        CMRelease(rep->path);
     delete rep;
 }
 
@@ -133,9 +146,10 @@ Ref<Instance> CMPI_Thread_Context::get_instance(const char* name_space, const In
     if (!name_space || !model || !top || !top->broker || !top->context)
         return Ref<Instance>();
 
+    CMPI_Made made;
     CMPIObjectPath* path = 0;
 
-    if (make_cmpi_object_path(top->broker, model, name_space, path) != 0)
+    if (make_cmpi_object_path(top->broker, model, name_space, path, &made) != 0)
         return Ref<Instance>();
 
     CMPIStatus st = { CMPI_RC_OK, 0 };
@@ -151,15 +165,15 @@ Ref<Instance> CMPI_Thread_Context::get_instance(const char* name_space, const In
 
 // The path and the CMPI form of an instance, for the calls that write.
 static int _prepare(CMPI_Thread_Context* top, const char* name_space,
-    const Instance* instance, CMPIObjectPath*& path, CMPIInstance*& ci)
+    const Instance* instance, CMPIObjectPath*& path, CMPIInstance*& ci, CMPI_Made& made)
 {
     path = 0;
     ci = 0;
 
-    if (make_cmpi_object_path(top->broker, instance, name_space, path) != 0)
+    if (make_cmpi_object_path(top->broker, instance, name_space, path, &made) != 0)
         return -1;
 
-    if (make_cmpi_instance(top->broker, instance, name_space, path, 0, ci) != 0)
+    if (make_cmpi_instance(top->broker, instance, name_space, path, 0, ci, &made) != 0)
     {
         CMRelease(path);
         path = 0;
@@ -176,17 +190,18 @@ int CMPI_Thread_Context::create_instance(const char* name_space, const Instance*
     if (!name_space || !instance || !top || !top->broker || !top->context)
         return -1;
 
+    CMPI_Made made;
     CMPIObjectPath* path;
     CMPIInstance* ci;
 
-    if (_prepare(top, name_space, instance, path, ci) != 0)
+    if (_prepare(top, name_space, instance, path, ci, made) != 0)
         return -1;
 
     CMPIStatus st = { CMPI_RC_OK, 0 };
-    CMPIObjectPath* made = CBCreateInstance(top->broker, top->context, path, ci, &st);
+    CMPIObjectPath* created = CBCreateInstance(top->broker, top->context, path, ci, &st);
 
-    if (made)
-        CMRelease(made);
+    if (created)
+        CMRelease(created);
     CMRelease(ci);
     CMRelease(path);
     return st.rc == CMPI_RC_OK ? 0 : -1;
@@ -199,10 +214,11 @@ int CMPI_Thread_Context::modify_instance(const char* name_space, const Instance*
     if (!name_space || !instance || !top || !top->broker || !top->context)
         return -1;
 
+    CMPI_Made made;
     CMPIObjectPath* path;
     CMPIInstance* ci;
 
-    if (_prepare(top, name_space, instance, path, ci) != 0)
+    if (_prepare(top, name_space, instance, path, ci, made) != 0)
         return -1;
 
     // Through the table: some servers' 1.0 headers lack the macro.
@@ -220,9 +236,10 @@ int CMPI_Thread_Context::delete_instance(const char* name_space, const Instance*
     if (!name_space || !instance || !top || !top->broker || !top->context)
         return -1;
 
+    CMPI_Made made;
     CMPIObjectPath* path = 0;
 
-    if (make_cmpi_object_path(top->broker, instance, name_space, path) != 0)
+    if (make_cmpi_object_path(top->broker, instance, name_space, path, &made) != 0)
         return -1;
 
     CMPIStatus st = CBDeleteInstance(top->broker, top->context, path);
@@ -246,11 +263,12 @@ int CMPI_Thread_Context::invoke_method(
     const CMPIBroker* mb = top->broker;
     const Meta_Repository* mr = instance->meta_class->meta_repository;
     const Meta_Method* mm = (const Meta_Method*)method->meta_class;
+    CMPI_Made made;
     CMPIObjectPath* path = 0;
 
     if (mm->flags & FLAG_STATIC)
         path = CMNewObjectPath(mb, name_space, instance->meta_class->name, 0);
-    else if (make_cmpi_object_path(mb, instance, name_space, path) != 0)
+    else if (make_cmpi_object_path(mb, instance, name_space, path, &made) != 0)
         path = 0;
 
     if (!path)
@@ -273,11 +291,12 @@ int CMPI_Thread_Context::invoke_method(
         return -1;
     }
 
-    CMPIArgs_Container in(mr, mb, name_space, in_args);
+    CMPIArgs_Container in(mr, mb, name_space, in_args, &made);
     in.convert(method, FLAG_IN);
 
     CMPIStatus st = { CMPI_RC_OK, 0 };
     CMPIData data = CBInvokeMethod(mb, top->context, path, mm->name, in_args, out_args, &st);
+    _read_by_pointer(data);
     int result = 0;
 
     if (st.rc != CMPI_RC_OK)
@@ -289,6 +308,7 @@ int CMPI_Thread_Context::invoke_method(
     {
         const char* ns = _name_space_of(path);
         CMPIArgs_Container out(mr, mb, ns, out_args);
+        out.upcall = true;
         out.convert((const Meta_Class*)mm, FLAG_OUT, method);
         __set_name_space_recursive(method, ns, false);
 

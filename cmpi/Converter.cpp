@@ -1,3 +1,4 @@
+#include <cstdlib>
 #include <cstring>
 #include "Converter.h"
 #include "CMPI_Containers.h"
@@ -519,6 +520,81 @@ Instance* _to_tessel_instance(const Meta_Repository* mr, const CMPIBroker* broke
 //
 // Runtime values to CMPI.
 //
+// Who frees what: servers keep the pointers of what they are given (an array
+// its elements), so nothing made here is released while anything may still
+// refer to it. In a request, every object made is left to the broker, which
+// frees it when the request ends; a caller outside any request passes a
+// CMPI_Made and releases it after the server has consumed the object given
+// back.
+//
+
+// Whether data holds an encapsulated object by its pointer.
+static bool _has_object(const CMPIData& data)
+{
+    if (data.type & CMPI_ARRAY)
+        return data.value.array != 0;
+
+    return (data.type == CMPI_string || data.type == CMPI_dateTime ||
+        data.type == CMPI_ref || data.type == CMPI_instance) && data.value.inst;
+}
+
+CMPI_Made::CMPI_Made() : _data(0), _size(0), _capacity(0)
+{
+}
+
+CMPI_Made::~CMPI_Made()
+{
+    release();
+    free(_data);
+}
+
+void CMPI_Made::add(const CMPIData& data)
+{
+    if (!_has_object(data) || (data.state & CMPI_nullValue))
+        return;
+
+    if (_size == _capacity)
+    {
+        size_t capacity = _capacity ? _capacity * 2 : 16;
+        CMPIData* grown = (CMPIData*)realloc(_data, capacity * sizeof(CMPIData));
+
+        // Unrecorded, the object stays with the broker.
+        if (!grown)
+            return;
+
+        _data = grown;
+        _capacity = capacity;
+    }
+
+    _data[_size++] = data;
+}
+
+void CMPI_Made::release()
+{
+    while (_size)
+        _release_cmpi_data(_data[--_size]);
+}
+
+static void _made(CMPI_Made* made, CMPIType type, void* object)
+{
+    if (!made || !object)
+        return;
+
+    CMPIData data;
+    memset(&data, 0, sizeof(data));
+    data.type = type;
+    data.value.inst = (CMPIInstance*)object;
+    made->add(data);
+}
+
+void _read_by_pointer(CMPIData& data)
+{
+    if (!(data.state & CMPI_nullValue))
+        return;
+
+    if (_has_object(data))
+        data.state &= ~CMPI_nullValue;
+}
 
 void _release_cmpi_data(CMPIData& data)
 {
@@ -565,23 +641,29 @@ static const CMPIType _cmpi_types[14] =
     CMPI_real64, CMPI_char16, CMPI_string, CMPI_dateTime,
 };
 
-static CMPIString* _new_string(const CMPIBroker* broker, const String& s)
+static CMPIString* _new_string(const CMPIBroker* broker, const String& s, CMPI_Made* made)
 {
-    return CMNewString(broker, s.c_str(), 0);
+    CMPIString* str = CMNewString(broker, s.c_str(), 0);
+    _made(made, CMPI_string, str);
+    return str;
 }
 
-static CMPIDateTime* _new_datetime(const CMPIBroker* broker, const Datetime& dt)
+static CMPIDateTime* _new_datetime(const CMPIBroker* broker, const Datetime& dt,
+    CMPI_Made* made)
 {
-    return CMNewDateTimeFromChars(broker, dt.ascii(false).c_str(), 0);
+    CMPIDateTime* x = CMNewDateTimeFromChars(broker, dt.ascii(false).c_str(), 0);
+    _made(made, CMPI_dateTime, x);
+    return x;
 }
 
 template<class T>
 static int to_cmpi_scalar(const Meta_Repository* mr, const CMPIBroker* broker,
-    const char* name_space, T x, CMPIType type, CMPIData& data);
+    const char* name_space, T x, CMPIType type, CMPIData& data, CMPI_Made* made);
 
 template<>
 int to_cmpi_scalar<const Instance*>(const Meta_Repository* mr, const CMPIBroker* broker,
-    const char* name_space, const Instance* instance, CMPIType type, CMPIData& data)
+    const char* name_space, const Instance* instance, CMPIType type, CMPIData& data,
+    CMPI_Made* made)
 {
     memset(&data, 0, sizeof(data));
 
@@ -610,6 +692,7 @@ int to_cmpi_scalar<const Instance*>(const Meta_Repository* mr, const CMPIBroker*
 
     CMPIStatus st = { CMPI_RC_OK, 0 };
     CMPIObjectPath* path = CMNewObjectPath(broker, ns, class_name, &st);
+    _made(made, CMPI_ref, path);
 
     if (st.rc != CMPI_RC_OK || !path)
     {
@@ -617,12 +700,11 @@ int to_cmpi_scalar<const Instance*>(const Meta_Repository* mr, const CMPIBroker*
         return -1;
     }
 
-    CMPIObjectPath_Container path_cont(mr, broker, ns, path);
+    CMPIObjectPath_Container path_cont(mr, broker, ns, path, made);
 
     if (path_cont.convert(instance, FLAG_KEY) != 0)
     {
         TLOG(LL_WARN, "Container::convert() failed");
-        CMRelease(path);
         return -1;
     }
 
@@ -636,7 +718,7 @@ int to_cmpi_scalar<const Instance*>(const Meta_Repository* mr, const CMPIBroker*
     if (type == CMPI_instance)
     {
         CMPIInstance* ci = CMNewInstance(broker, path, &st);
-        CMRelease(path);
+        _made(made, CMPI_instance, ci);
 
         if (st.rc != CMPI_RC_OK || !ci)
         {
@@ -644,12 +726,11 @@ int to_cmpi_scalar<const Instance*>(const Meta_Repository* mr, const CMPIBroker*
             return -1;
         }
 
-        CMPIInstance_Container inst_cont(mr, broker, ns, ci);
+        CMPIInstance_Container inst_cont(mr, broker, ns, ci, made);
 
         if (inst_cont.convert(instance, 0) != 0)
         {
             TLOG(LL_WARN, "Container::convert() failed");
-            CMRelease(ci);
             return -1;
         }
 
@@ -658,7 +739,6 @@ int to_cmpi_scalar<const Instance*>(const Meta_Repository* mr, const CMPIBroker*
         return 0;
     }
 
-    CMRelease(path);
     TLOG(LL_WARN, "unexpected type");
     return -1;
 }
@@ -670,11 +750,11 @@ static bool _embedded(uint32 flags)
 
 // One array element of a scalar type into a CMPIValue.
 template<class T>
-static int _cmpi_element(const CMPIBroker* broker, const T& x, CMPIValue& v);
+static int _cmpi_element(const CMPIBroker* broker, const T& x, CMPIValue& v, CMPI_Made* made);
 
 #define OLMA_ELEMENT(T, MEMBER) \
     template<> \
-    int _cmpi_element<T>(const CMPIBroker*, const T& x, CMPIValue& v) \
+    int _cmpi_element<T>(const CMPIBroker*, const T& x, CMPIValue& v, CMPI_Made*) \
     { \
         v.MEMBER = x; \
         return 0; \
@@ -694,41 +774,44 @@ OLMA_ELEMENT(real64, real64)
 #undef OLMA_ELEMENT
 
 template<>
-int _cmpi_element<boolean>(const CMPIBroker*, const boolean& x, CMPIValue& v)
+int _cmpi_element<boolean>(const CMPIBroker*, const boolean& x, CMPIValue& v, CMPI_Made*)
 {
     v.boolean = x ? 1 : 0;
     return 0;
 }
 
 template<>
-int _cmpi_element<char16>(const CMPIBroker*, const char16& x, CMPIValue& v)
+int _cmpi_element<char16>(const CMPIBroker*, const char16& x, CMPIValue& v, CMPI_Made*)
 {
     v.char16 = x.code();
     return 0;
 }
 
 template<>
-int _cmpi_element<String>(const CMPIBroker* broker, const String& x, CMPIValue& v)
+int _cmpi_element<String>(const CMPIBroker* broker, const String& x, CMPIValue& v,
+    CMPI_Made* made)
 {
-    v.string = _new_string(broker, x);
+    v.string = _new_string(broker, x, made);
     return v.string ? 0 : -1;
 }
 
 template<>
-int _cmpi_element<Datetime>(const CMPIBroker* broker, const Datetime& x, CMPIValue& v)
+int _cmpi_element<Datetime>(const CMPIBroker* broker, const Datetime& x, CMPIValue& v,
+    CMPI_Made* made)
 {
-    v.dateTime = _new_datetime(broker, x);
+    v.dateTime = _new_datetime(broker, x, made);
     return v.dateTime ? 0 : -1;
 }
 
 template<class T>
 static int _to_cmpi_array(const CMPIBroker* broker, const Value& value,
-    CMPIType element_type, CMPIData& data)
+    CMPIType element_type, CMPIData& data, CMPI_Made* made)
 {
     Array<T> a;
     value.get_value(a);
 
     CMPIArray* array = CMNewArray(broker, (CMPICount)a.size(), element_type, 0);
+    _made(made, element_type | CMPI_ARRAY, array);
 
     if (!array)
     {
@@ -742,20 +825,17 @@ static int _to_cmpi_array(const CMPIBroker* broker, const Value& value,
         memset(&e, 0, sizeof(e));
         e.type = element_type;
 
-        if (_cmpi_element<T>(broker, a[i], e.value) != 0)
+        if (_cmpi_element<T>(broker, a[i], e.value, made) != 0)
         {
             TLOG(LL_WARN, "CMSetArrayElementAt() failed");
-            CMRelease(array);
             return -1;
         }
 
         CMPIStatus st = CMSetArrayElementAt(array, (CMPICount)i, &e.value, element_type);
-        _release_cmpi_data(e);
 
         if (st.rc != CMPI_RC_OK)
         {
             TLOG(LL_WARN, "CMSetArrayElementAt() failed");
-            CMRelease(array);
             return -1;
         }
     }
@@ -766,12 +846,14 @@ static int _to_cmpi_array(const CMPIBroker* broker, const Value& value,
 }
 
 static int _to_cmpi_instance_array(const Meta_Repository* mr, const CMPIBroker* broker,
-    const char* name_space, const Value& value, CMPIType element_type, CMPIData& data)
+    const char* name_space, const Value& value, CMPIType element_type, CMPIData& data,
+    CMPI_Made* made)
 {
     Array<Instance*> a;
     value.get_value(a);
 
     CMPIArray* array = CMNewArray(broker, (CMPICount)a.size(), element_type, 0);
+    _made(made, element_type | CMPI_ARRAY, array);
 
     if (!array)
     {
@@ -783,20 +865,18 @@ static int _to_cmpi_instance_array(const Meta_Repository* mr, const CMPIBroker* 
     {
         CMPIData e;
 
-        if (to_cmpi_scalar<const Instance*>(mr, broker, name_space, a[i], element_type, e) != 0)
+        if (to_cmpi_scalar<const Instance*>(mr, broker, name_space, a[i], element_type, e,
+            made) != 0)
         {
             TLOG(LL_WARN, "element conversion failed");
-            CMRelease(array);
             return -1;
         }
 
         CMPIStatus st = CMSetArrayElementAt(array, (CMPICount)i, &e.value, element_type);
-        _release_cmpi_data(e);
 
         if (st.rc != CMPI_RC_OK)
         {
             TLOG(LL_WARN, "CMSetArrayElementAt() failed");
-            CMRelease(array);
             return -1;
         }
     }
@@ -807,7 +887,8 @@ static int _to_cmpi_instance_array(const Meta_Repository* mr, const CMPIBroker* 
 }
 
 int _to_cmpi_data(const Meta_Repository* mr, const CMPIBroker* broker,
-    const char* name_space, const Value& value, uint32 flags, CMPIData& data)
+    const char* name_space, const Value& value, uint32 flags, CMPIData& data,
+    CMPI_Made* made)
 {
     memset(&data, 0, sizeof(data));
 
@@ -863,7 +944,7 @@ int _to_cmpi_data(const Meta_Repository* mr, const CMPIBroker* broker,
             String x;
             value.get_value(x);
             data.type = CMPI_string;
-            data.value.string = _new_string(broker, x);
+            data.value.string = _new_string(broker, x, made);
             if (!data.value.string)
             {
                 TLOG(LL_WARN, "CMNewString() failed");
@@ -877,7 +958,7 @@ int _to_cmpi_data(const Meta_Repository* mr, const CMPIBroker* broker,
             Datetime x;
             value.get_value(x);
             data.type = CMPI_dateTime;
-            data.value.dateTime = _new_datetime(broker, x);
+            data.value.dateTime = _new_datetime(broker, x, made);
             if (!data.value.dateTime)
             {
                 TLOG(LL_WARN, "CMNewDateTimeFromChars() failed");
@@ -891,27 +972,32 @@ int _to_cmpi_data(const Meta_Repository* mr, const CMPIBroker* broker,
             Instance* x = 0;
             value.get_value(x);
             return to_cmpi_scalar<const Instance*>(mr, broker, name_space, x,
-                _embedded(flags) ? CMPI_instance : CMPI_ref, data);
+                _embedded(flags) ? CMPI_instance : CMPI_ref, data, made);
         }
 
-        case Value::BOOLEAN_ARRAY: return _to_cmpi_array<boolean>(broker, value, CMPI_boolean, data);
-        case Value::UINT8_ARRAY: return _to_cmpi_array<uint8>(broker, value, CMPI_uint8, data);
-        case Value::SINT8_ARRAY: return _to_cmpi_array<sint8>(broker, value, CMPI_sint8, data);
-        case Value::UINT16_ARRAY: return _to_cmpi_array<uint16>(broker, value, CMPI_uint16, data);
-        case Value::SINT16_ARRAY: return _to_cmpi_array<sint16>(broker, value, CMPI_sint16, data);
-        case Value::UINT32_ARRAY: return _to_cmpi_array<uint32>(broker, value, CMPI_uint32, data);
-        case Value::SINT32_ARRAY: return _to_cmpi_array<sint32>(broker, value, CMPI_sint32, data);
-        case Value::UINT64_ARRAY: return _to_cmpi_array<uint64>(broker, value, CMPI_uint64, data);
-        case Value::SINT64_ARRAY: return _to_cmpi_array<sint64>(broker, value, CMPI_sint64, data);
-        case Value::REAL32_ARRAY: return _to_cmpi_array<real32>(broker, value, CMPI_real32, data);
-        case Value::REAL64_ARRAY: return _to_cmpi_array<real64>(broker, value, CMPI_real64, data);
-        case Value::CHAR16_ARRAY: return _to_cmpi_array<char16>(broker, value, CMPI_char16, data);
-        case Value::STRING_ARRAY: return _to_cmpi_array<String>(broker, value, CMPI_string, data);
-        case Value::DATETIME_ARRAY: return _to_cmpi_array<Datetime>(broker, value, CMPI_dateTime, data);
+#define OLMA_ARRAY(TYPE, T, CMPI_TYPE) \
+        case Value::TYPE: return _to_cmpi_array<T>(broker, value, CMPI_TYPE, data, made);
+
+        OLMA_ARRAY(BOOLEAN_ARRAY, boolean, CMPI_boolean)
+        OLMA_ARRAY(UINT8_ARRAY, uint8, CMPI_uint8)
+        OLMA_ARRAY(SINT8_ARRAY, sint8, CMPI_sint8)
+        OLMA_ARRAY(UINT16_ARRAY, uint16, CMPI_uint16)
+        OLMA_ARRAY(SINT16_ARRAY, sint16, CMPI_sint16)
+        OLMA_ARRAY(UINT32_ARRAY, uint32, CMPI_uint32)
+        OLMA_ARRAY(SINT32_ARRAY, sint32, CMPI_sint32)
+        OLMA_ARRAY(UINT64_ARRAY, uint64, CMPI_uint64)
+        OLMA_ARRAY(SINT64_ARRAY, sint64, CMPI_sint64)
+        OLMA_ARRAY(REAL32_ARRAY, real32, CMPI_real32)
+        OLMA_ARRAY(REAL64_ARRAY, real64, CMPI_real64)
+        OLMA_ARRAY(CHAR16_ARRAY, char16, CMPI_char16)
+        OLMA_ARRAY(STRING_ARRAY, String, CMPI_string)
+        OLMA_ARRAY(DATETIME_ARRAY, Datetime, CMPI_dateTime)
+
+#undef OLMA_ARRAY
 
         case Value::INSTANCE_ARRAY:
             return _to_cmpi_instance_array(mr, broker, name_space, value,
-                _embedded(flags) ? CMPI_instance : CMPI_ref, data);
+                _embedded(flags) ? CMPI_instance : CMPI_ref, data, made);
 
         default:
             break;
@@ -1005,7 +1091,7 @@ static const Meta_Repository* _repository_of(const Instance* instance)
 }
 
 int make_cmpi_object_path(const CMPIBroker* broker, const Instance* instance,
-    const char* name_space, CMPIObjectPath*& object_path)
+    const char* name_space, CMPIObjectPath*& object_path, CMPI_Made* made)
 {
     object_path = 0;
 
@@ -1018,7 +1104,7 @@ int make_cmpi_object_path(const CMPIBroker* broker, const Instance* instance,
     if (!object_path)
         return CMPI_RC_ERR_FAILED;
 
-    CMPIObjectPath_Container cont(_repository_of(instance), broker, ns, object_path);
+    CMPIObjectPath_Container cont(_repository_of(instance), broker, ns, object_path, made);
 
     if (cont.convert(instance, FLAG_KEY) != 0)
     {
@@ -1030,38 +1116,58 @@ int make_cmpi_object_path(const CMPIBroker* broker, const Instance* instance,
     return CMPI_RC_OK;
 }
 
+// The names of the class's keys, null-terminated, in names (room for
+// max + 1); the count.
+static size_t _key_names(const Meta_Class* mc, const char** names, size_t max)
+{
+    size_t n = 0;
+
+    for (size_t i = 0; mc && i < mc->num_meta_features && n < max; i++)
+    {
+        const Meta_Feature* mf = mc->meta_features[i];
+
+        if ((mf->flags & FLAG_KEY) && (mf->flags & (FLAG_PROPERTY | FLAG_REFERENCE)))
+            names[n++] = mf->name;
+    }
+
+    names[n] = 0;
+    return n;
+}
+
 int make_cmpi_instance(const CMPIBroker* broker, const Instance* instance,
     const char* name_space, const CMPIObjectPath* object_path,
-    const char** properties, CMPIInstance*& cmpi_instance)
+    const char** properties, CMPIInstance*& cmpi_instance, CMPI_Made* made)
 {
     cmpi_instance = 0;
 
     if (!broker || !instance)
         return CMPI_RC_ERR_FAILED;
 
-    CMPIObjectPath* own_path = 0;
-
     if (!object_path)
     {
         TLOG(LL_WARN, "No ObjectPath built before call to make_CMPI_instance");
 
-        if (make_cmpi_object_path(broker, instance, name_space, own_path) != 0)
+        CMPIObjectPath* own_path = 0;
+
+        if (make_cmpi_object_path(broker, instance, name_space, own_path, made) != 0)
             return CMPI_RC_ERR_FAILED;
 
+        _made(made, CMPI_ref, own_path);
         object_path = own_path;
     }
 
     cmpi_instance = CMNewInstance(broker, object_path, 0);
-
-    if (own_path)
-        CMRelease(own_path);
 
     if (!cmpi_instance)
         return CMPI_RC_ERR_FAILED;
 
     if (properties)
     {
-        CMPIStatus st = CMSetPropertyFilter(cmpi_instance, properties, 0);
+        // A server that builds the path from the key properties left on the
+        // instance needs the keys named, or the client gets paths without.
+        const char* keys[33];
+        _key_names(instance->meta_class, keys, 32);
+        CMPIStatus st = CMSetPropertyFilter(cmpi_instance, properties, keys);
 
         if (st.rc != CMPI_RC_OK)
         {
@@ -1072,7 +1178,7 @@ int make_cmpi_instance(const CMPIBroker* broker, const Instance* instance,
     }
 
     const char* ns = name_space ? name_space : "";
-    CMPIInstance_Container cont(_repository_of(instance), broker, ns, cmpi_instance);
+    CMPIInstance_Container cont(_repository_of(instance), broker, ns, cmpi_instance, made);
 
     if (cont.convert(instance, 0) != 0)
     {

@@ -37,13 +37,43 @@ int make_tessel_method(const CMPIBroker* broker, const Meta_Class* meta_class,
 // Instance to CMPI. Null properties are left out.
 //
 
-int make_cmpi_object_path(const CMPIBroker* broker, const Instance* instance,
-    const char* name_space, CMPIObjectPath*& object_path);
+// The objects that a conversion made through the broker, besides the one it
+// gives back, for a caller that frees them itself once nothing refers to
+// them any more. Its destructor releases them.
+class CMPI_Made
+{
+public:
 
-// A null object_path is built from the instance's keys.
+    CMPI_Made();
+    ~CMPI_Made();
+
+    // Records the encapsulated object of data, if it has one.
+    void add(const CMPIData& data);
+
+    // Releases everything recorded, the newest first.
+    void release();
+
+    size_t size() const { return _size; }
+
+private:
+
+    CMPI_Made(const CMPI_Made&);
+    CMPI_Made& operator=(const CMPI_Made&);
+
+    CMPIData* _data;
+    size_t _size;
+    size_t _capacity;
+};
+
+// With a null made, the objects made are left to the broker.
+int make_cmpi_object_path(const CMPIBroker* broker, const Instance* instance,
+    const char* name_space, CMPIObjectPath*& object_path, CMPI_Made* made = 0);
+
+// A null object_path is built from the instance's keys. A property list
+// never drops the class's keys.
 int make_cmpi_instance(const CMPIBroker* broker, const Instance* instance,
     const char* name_space, const CMPIObjectPath* object_path,
-    const char** properties, CMPIInstance*& cmpi_instance);
+    const char** properties, CMPIInstance*& cmpi_instance, CMPI_Made* made = 0);
 
 // The output parameters go to out_args; the method's result to return_value
 // and return_type (type 0 if it is null).
@@ -60,14 +90,18 @@ int cmpi_to_tessel_value(const Meta_Repository* meta_repository,
     Value& value);
 
 // flags are the feature's: EmbeddedObject or EmbeddedInstance make an
-// instance a CMPI_instance, else it becomes a CMPI_ref.
+// instance a CMPI_instance, else it becomes a CMPI_ref. Every object made on
+// the way goes to made, if given.
 int _to_cmpi_data(const Meta_Repository* meta_repository,
     const CMPIBroker* broker, const char* name_space, const Value& value,
-    uint32 flags, CMPIData& data);
+    uint32 flags, CMPIData& data, CMPI_Made* made = 0);
 
-// Releases the encapsulated object that _to_cmpi_data made, once the server
-// has copied it.
+// Releases the encapsulated object of data.
 void _release_cmpi_data(CMPIData& data);
+
+// A result that a server hands back from an up-call, as good data when its
+// pointer is there: some servers mark good instances as null.
+void _read_by_pointer(CMPIData& data);
 
 Instance* _to_tessel_instance(const Meta_Repository* meta_repository,
     const CMPIBroker* broker, const char* name_space, const CMPIObjectPath* object_path);

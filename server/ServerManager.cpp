@@ -45,7 +45,9 @@ bool buildVersionNumbers(const char* version, uint16& major, uint16& minor, uint
 namespace
 {
 
-const char INTEROP_NAMESPACE[] = "root/PG_InterOp";
+// Where CIM servers keep their own object manager: OpenPegasus in the
+// first, SFCB in the second.
+const char* const INTEROP_NAMESPACES[] = { "root/PG_InterOp", "root/interop" };
 const char SERVED_NAMESPACE[] = "root/vespera";
 // What the object manager is called when the CIM server can't tell us.
 const char CIM_SERVER[] = "CIM Server";
@@ -176,23 +178,24 @@ enum Interop_Answer
     INTEROP_FOUND,
 };
 
-// Asks the CIM server for its own object manager. On INTEROP_FOUND the
-// properties given take the first instance's ElementName, Description and
-// Name, each with its null state; otherwise they are left alone.
-Interop_Answer askObjectManager(
+// Asks the CIM server for its own object manager in one namespace. On
+// INTEROP_FOUND the properties given take the first instance's ElementName,
+// Description and Name, each with its null state; otherwise they are left
+// alone.
+Interop_Answer askObjectManagerIn(const char* nameSpace,
     Property<String>* elementName, Property<String>* description, Property<String>* name)
 {
     CIM_ObjectManager* model = create<CIM_ObjectManager>(true);
     Interop_Answer answer = INTEROP_FAILED;
     {
         Instance_Enumerator e;
-        if (cimom::enum_instances(INTEROP_NAMESPACE, model, e) != 0)
+        if (cimom::enum_instances(nameSpace, model, e) != 0)
         {
-            TLOG(LL_WARN, "Unable to enumerate CIM_ObjectManager in %s", INTEROP_NAMESPACE);
+            TLOG(LL_WARN, "Unable to enumerate CIM_ObjectManager in %s", nameSpace);
         }
         else if (!e)
         {
-            TLOG(LL_INFO, "No CIM_ObjectManager in %s", INTEROP_NAMESPACE);
+            TLOG(LL_INFO, "No CIM_ObjectManager in %s", nameSpace);
             answer = INTEROP_EMPTY;
         }
         else
@@ -214,12 +217,31 @@ Interop_Answer askObjectManager(
                 // Unreadable is as good as unanswered: the caller falls back
                 // to the generic name.
                 TLOG(LL_WARN, "The CIM server returned no usable CIM_ObjectManager from %s",
-                    INTEROP_NAMESPACE);
+                    nameSpace);
             }
         }
     }
     destroy(model);
     return answer;
+}
+
+// The first interop namespace that the server can enumerate answers.
+Interop_Answer askObjectManager(
+    Property<String>* elementName, Property<String>* description, Property<String>* name)
+{
+    Interop_Answer answer = INTEROP_FAILED;
+    for (size_t i = 0; answer == INTEROP_FAILED &&
+        i < sizeof(INTEROP_NAMESPACES) / sizeof(INTEROP_NAMESPACES[0]); i++)
+        answer = askObjectManagerIn(INTEROP_NAMESPACES[i], elementName, description, name);
+    return answer;
+}
+
+// A key that the server left unnamed takes the generic name: a null key
+// would make the instance unreachable.
+void nameKey(Property<String>& key)
+{
+    if (key.null)
+        key.set(CIM_SERVER);
 }
 
 } // namespace
@@ -330,8 +352,8 @@ Array<Instance*> ServerManager::getNamespaceInstances()
     ns->ClassType.set(2);
     ns->ClassTypeVersion.set("2.26.0");
 
-    if (askObjectManager(0, 0, &ns->ObjectManagerName) == INTEROP_FAILED)
-        ns->ObjectManagerName.set(CIM_SERVER);
+    askObjectManager(0, 0, &ns->ObjectManagerName);
+    nameKey(ns->ObjectManagerName);
 
     Array<Instance*> result;
     result.append(ns);
@@ -354,6 +376,7 @@ Array<Instance*> ServerManager::getObjectManagerInstance()
         om->Caption.set(CIM_SERVER);
         om->Description.set(CIM_SERVER);
     }
+    nameKey(om->Name);
 
     Array<Instance*> result;
     result.append(om);

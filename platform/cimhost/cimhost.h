@@ -25,9 +25,27 @@
 //     for (auto& inst : r.instances)
 //         printf("%s\n", inst.get_text("DeviceID").c_str());
 //
-// Every CMPI object that the host hands to a provider during an operation is
-// freed when the operation ends, unless the provider released it first; the
-// results are plain C++ copies and own nothing of CMPI.
+// The host is as strict as the strictest CIM server about the CMPI objects a
+// provider makes and hands over:
+//  - Instances, object paths, argument lists and arrays keep the pointers of
+//    the strings, datetimes, arrays, paths and instances they are given (text
+//    given as CMPI_chars is copied), and read them only when they are read or
+//    consumed: returned (CMReturnInstance, ...), delivered, or passed to an
+//    up-call. So a provider must not release an object while another one may
+//    still refer to it.
+//  - A released object is poisoned: any later use, directly or through a
+//    container that kept its pointer, aborts the process with a message on
+//    stderr naming the object (its kind and what it held) and the way it was
+//    reached.
+//  - Everything made during a request is freed when the request ends; an
+//    up-call is a request of its own, and a thread attached with
+//    CBAttachThread keeps what it makes until it detaches. Results are plain
+//    C++ copies and own nothing of CMPI.
+//  - The path of a returned instance is built from the key properties left
+//    on it (an instance made from a path starts with the path's keys as
+//    properties). With a property list, the filter (CMSetPropertyFilter)
+//    keeps only the properties of the list and of the key list the provider
+//    gives: a provider that passes no key list returns paths without keys.
 //
 // A Host is not meant to be shared between threads that call it at the same
 // time; providers' own threads may call the broker at any time.
@@ -149,12 +167,18 @@ struct Options
     // Defaults: the module and .reg file of the build that made this library.
     std::string module_path;
     std::string reg_path;
-    // Serve "root/PG_InterOp" CIM_ObjectManager from the built-in stand-in.
-    // When off, enumerations of that namespace fail with
+    // Serve CIM_ObjectManager in the interop namespace from the built-in
+    // stand-in. When off, enumerations of that namespace fail with
     // CMPI_RC_ERR_INVALID_NAMESPACE.
     bool interop = true;
     // When on together with interop, the stand-in answers with no instance.
     bool interop_empty = false;
+    // The interop namespace: OpenPegasus's by default; SFCB's is "root/interop".
+    std::string interop_namespace = "root/PG_InterOp";
+    // Enumerations that up-calls (CBEnumInstances, CBAssociators, ...) hand
+    // back give their instances as OpenPegasus does: state CMPI_nullValue,
+    // with a valid value.inst.
+    bool pegasus_enumerations = false;
     // The "CMPIPrincipal" entry of every context.
     std::string principal = "cimhost";
     // The classes the host knows, as a server knows those compiled into its
@@ -196,8 +220,10 @@ public:
     bool ok() const;
     const std::string& error() const;
 
-    // Switch the "root/PG_InterOp" stand-in on or off between operations.
+    // Switch the interop stand-in on or off between operations.
     void set_interop(bool on, bool empty = false);
+    void set_interop_namespace(const std::string& name_space);
+    void set_pegasus_enumerations(bool on);
 
     // Operations. `props` null means all properties, and the host passes the
     // list to the provider without filtering the answer itself. For ei/ein
@@ -290,7 +316,8 @@ public:
     // Raw access for tests that talk CMPI themselves.
     const CMPIBroker* broker() const;
     // Number of CMPI objects alive now (released ones excluded); 0 between
-    // operations if nothing leaked into the global scope.
+    // operations if nothing leaked into the global scope. Objects that an
+    // attached thread makes count until it detaches.
     size_t live_objects() const;
 
 private:

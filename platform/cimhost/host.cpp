@@ -28,8 +28,6 @@ namespace cimhost
 namespace
 {
 
-const char INTEROP_NS[] = "root/PG_InterOp";
-
 // The MIs the host holds of one provider, and its indication bookkeeping
 // (touched only by the thread that drives the host).
 struct Provider_State
@@ -188,7 +186,7 @@ public:
 
     bool is_interop(const std::string& ns) const
     {
-        return name_eq(ns, INTEROP_NS) && !known_ns(ns);
+        return name_eq(ns, opts.interop_namespace) && !known_ns(ns);
     }
 
     void* mi_for(const std::string& provider, unsigned kind, const std::string& ns, CMPIrc& rc,
@@ -214,7 +212,7 @@ public:
             ns = default_ns;
         if (known_ns(ns))
             return CMPI_RC_OK;
-        if (name_eq(ns, INTEROP_NS) && opts.interop)
+        if (name_eq(ns, opts.interop_namespace) && opts.interop)
             return CMPI_RC_OK;
         msg = "namespace " + ns + " is not served";
         return CMPI_RC_ERR_INVALID_NAMESPACE;
@@ -321,13 +319,12 @@ CMPIStatus b_deliver(const CMPIBroker* mb, const CMPIContext* ctx, const char* n
     Host_Impl* h = host_of(mb);
     if (!h || !obj_cast<Ctx_Obj>(ctx, K_CONTEXT))
         return status(CMPI_RC_ERR_INVALID_HANDLE);
-    Inst_Obj* io = obj_cast<Inst_Obj>(ind, K_INSTANCE);
+    Inst_Obj* io = obj_cast<Inst_Obj>(ind, K_INSTANCE, "CBDeliverIndication");
     if (!io || !ns)
         return status(ind && ns ? CMPI_RC_ERR_INVALID_HANDLE : CMPI_RC_ERR_INVALID_PARAMETER);
     Indication_Record r;
     r.name_space = ns;
-    r.instance = io->data;
-    r.instance.path = instance_path(io->data);
+    r.instance = read_instance(io, "CBDeliverIndication");
     {
         std::lock_guard<std::mutex> g(h->ind_mutex);
         h->inds.push_back(r);
@@ -336,60 +333,70 @@ CMPIStatus b_deliver(const CMPIBroker* mb, const CMPIContext* ctx, const char* n
     return status(CMPI_RC_OK);
 }
 
-// The checks every up-call makes of its arguments.
-Path_Obj* upcall_path(const CMPIBroker* mb, const CMPIContext* ctx, const CMPIObjectPath* op,
-                      CMPIStatus* rc)
+// The checks every up-call makes of its arguments; the path as it is read
+// when the call is made.
+bool upcall_path(const CMPIBroker* mb, const CMPIContext* ctx, const CMPIObjectPath* op,
+                 const char* call, Object_Path& path, CMPIStatus* rc)
 {
-    Path_Obj* p = obj_cast<Path_Obj>(op, K_PATH);
-    if (!host_of(mb) || !obj_cast<Ctx_Obj>(ctx, K_CONTEXT) || (op && !p))
+    Path_Obj* p = obj_cast<Path_Obj>(op, K_PATH, call);
+    if (!host_of(mb) || !obj_cast<Ctx_Obj>(ctx, K_CONTEXT, call) || (op && !p))
     {
         set_rc(rc, CMPI_RC_ERR_INVALID_HANDLE);
-        return nullptr;
+        return false;
     }
     if (!p)
+    {
         set_rc(rc, CMPI_RC_ERR_INVALID_PARAMETER);
-    return p;
+        return false;
+    }
+    path = read_path(p, call);
+    return true;
 }
 
-CMPIEnumeration* enum_result(CMPIrc code, const std::vector<Value>& items, CMPIStatus* rc)
+CMPIEnumeration* enum_result(const CMPIBroker* mb, CMPIrc code, const std::vector<Value>& items,
+                             CMPIStatus* rc)
 {
     set_rc(rc, code);
-    return code == CMPI_RC_OK ? new_enum(items) : nullptr;
+    if (code != CMPI_RC_OK)
+        return nullptr;
+    CMPIEnumeration* e = new_enum(items);
+    obj_cast<Enum_Obj>(e, K_ENUM)->null_state = host_of(mb)->opts.pegasus_enumerations;
+    return e;
 }
 
 CMPIEnumeration* b_enum_names(const CMPIBroker* mb, const CMPIContext* ctx,
                               const CMPIObjectPath* op, CMPIStatus* rc)
 {
-    Path_Obj* p = upcall_path(mb, ctx, op, rc);
-    if (!p)
+    Object_Path p;
+    if (!upcall_path(mb, ctx, op, "CBEnumInstanceNames", p, rc))
         return nullptr;
     std::vector<Value> out;
     std::string msg;
-    CMPIrc code = host_of(mb)->do_enum(p->data, nullptr, true, out, msg);
-    return enum_result(code, out, rc);
+    CMPIrc code = host_of(mb)->do_enum(p, nullptr, true, out, msg);
+    return enum_result(mb, code, out, rc);
 }
 
 CMPIEnumeration* b_enum(const CMPIBroker* mb, const CMPIContext* ctx, const CMPIObjectPath* op,
                         const char** props, CMPIStatus* rc)
 {
-    Path_Obj* p = upcall_path(mb, ctx, op, rc);
-    if (!p)
+    Object_Path p;
+    if (!upcall_path(mb, ctx, op, "CBEnumInstances", p, rc))
         return nullptr;
     std::vector<Value> out;
     std::string msg;
-    CMPIrc code = host_of(mb)->do_enum(p->data, props, false, out, msg);
-    return enum_result(code, out, rc);
+    CMPIrc code = host_of(mb)->do_enum(p, props, false, out, msg);
+    return enum_result(mb, code, out, rc);
 }
 
 CMPIInstance* b_get(const CMPIBroker* mb, const CMPIContext* ctx, const CMPIObjectPath* op,
                     const char** props, CMPIStatus* rc)
 {
-    Path_Obj* p = upcall_path(mb, ctx, op, rc);
-    if (!p)
+    Object_Path p;
+    if (!upcall_path(mb, ctx, op, "CBGetInstance", p, rc))
         return nullptr;
     Value out;
     std::string msg;
-    CMPIrc code = host_of(mb)->do_get(p->data, props, out, msg);
+    CMPIrc code = host_of(mb)->do_get(p, props, out, msg);
     set_rc(rc, code);
     return code == CMPI_RC_OK && out.inst ? new_instance(*out.inst) : nullptr;
 }
@@ -397,10 +404,10 @@ CMPIInstance* b_get(const CMPIBroker* mb, const CMPIContext* ctx, const CMPIObje
 CMPIObjectPath* b_create(const CMPIBroker* mb, const CMPIContext* ctx, const CMPIObjectPath* op,
                          const CMPIInstance* inst, CMPIStatus* rc)
 {
-    Path_Obj* p = upcall_path(mb, ctx, op, rc);
-    Inst_Obj* i = obj_cast<Inst_Obj>(inst, K_INSTANCE);
-    if (!p)
+    Object_Path p;
+    if (!upcall_path(mb, ctx, op, "CBCreateInstance", p, rc))
         return nullptr;
+    Inst_Obj* i = obj_cast<Inst_Obj>(inst, K_INSTANCE, "CBCreateInstance");
     if (!i)
     {
         set_rc(rc, inst ? CMPI_RC_ERR_INVALID_HANDLE : CMPI_RC_ERR_INVALID_PARAMETER);
@@ -408,7 +415,7 @@ CMPIObjectPath* b_create(const CMPIBroker* mb, const CMPIContext* ctx, const CMP
     }
     Object_Path made;
     std::string msg;
-    CMPIrc code = host_of(mb)->do_create(p->data, i->data, made, msg);
+    CMPIrc code = host_of(mb)->do_create(p, read_instance(i, "CBCreateInstance"), made, msg);
     set_rc(rc, code);
     return code == CMPI_RC_OK ? new_path(made) : nullptr;
 }
@@ -417,24 +424,25 @@ CMPIStatus b_modify(const CMPIBroker* mb, const CMPIContext* ctx, const CMPIObje
                     const CMPIInstance* inst, const char** props)
 {
     CMPIStatus st = status(CMPI_RC_OK);
-    Path_Obj* p = upcall_path(mb, ctx, op, &st);
-    if (!p)
+    Object_Path p;
+    if (!upcall_path(mb, ctx, op, "CBModifyInstance", p, &st))
         return st;
-    Inst_Obj* i = obj_cast<Inst_Obj>(inst, K_INSTANCE);
+    Inst_Obj* i = obj_cast<Inst_Obj>(inst, K_INSTANCE, "CBModifyInstance");
     if (!i)
         return status(inst ? CMPI_RC_ERR_INVALID_HANDLE : CMPI_RC_ERR_INVALID_PARAMETER);
     std::string msg;
-    return status(host_of(mb)->do_modify(p->data, i->data, props, msg));
+    return status(
+        host_of(mb)->do_modify(p, read_instance(i, "CBModifyInstance"), props, msg));
 }
 
 CMPIStatus b_delete(const CMPIBroker* mb, const CMPIContext* ctx, const CMPIObjectPath* op)
 {
     CMPIStatus st = status(CMPI_RC_OK);
-    Path_Obj* p = upcall_path(mb, ctx, op, &st);
-    if (!p)
+    Object_Path p;
+    if (!upcall_path(mb, ctx, op, "CBDeleteInstance", p, &st))
         return st;
     std::string msg;
-    return status(host_of(mb)->do_delete(p->data, msg));
+    return status(host_of(mb)->do_delete(p, msg));
 }
 
 CMPIEnumeration* b_query(const CMPIBroker*, const CMPIContext*, const CMPIObjectPath*,
@@ -448,14 +456,16 @@ CMPIEnumeration* b_assoc(Assoc_Op aop, const CMPIBroker* mb, const CMPIContext* 
                          const CMPIObjectPath* op, const char* assoc, const char* result,
                          const char* role, const char* rrole, const char** props, CMPIStatus* rc)
 {
-    Path_Obj* p = upcall_path(mb, ctx, op, rc);
-    if (!p)
+    static const char* const calls[] = {"CBAssociators", "CBAssociatorNames", "CBReferences",
+                                        "CBReferenceNames"};
+    Object_Path p;
+    if (!upcall_path(mb, ctx, op, calls[aop], p, rc))
         return nullptr;
     std::vector<Value> out;
     std::string msg;
-    CMPIrc code = host_of(mb)->do_assoc(aop, p->data, assoc ? assoc : "", result ? result : "",
+    CMPIrc code = host_of(mb)->do_assoc(aop, p, assoc ? assoc : "", result ? result : "",
                                         role ? role : "", rrole ? rrole : "", props, out, msg);
-    return enum_result(code, out, rc);
+    return enum_result(mb, code, out, rc);
 }
 
 CMPIEnumeration* b_associators(const CMPIBroker* mb, const CMPIContext* ctx,
@@ -500,11 +510,11 @@ CMPIData null_data()
 CMPIData b_invoke(const CMPIBroker* mb, const CMPIContext* ctx, const CMPIObjectPath* op,
                   const char* method, const CMPIArgs* in, CMPIArgs* out, CMPIStatus* rc)
 {
-    Path_Obj* p = upcall_path(mb, ctx, op, rc);
-    if (!p)
+    Object_Path p;
+    if (!upcall_path(mb, ctx, op, "CBInvokeMethod", p, rc))
         return null_data();
-    Args_Obj* ia = obj_cast<Args_Obj>(in, K_ARGS);
-    Args_Obj* oa = obj_cast<Args_Obj>(out, K_ARGS);
+    Args_Obj* ia = obj_cast<Args_Obj>(in, K_ARGS, "CBInvokeMethod");
+    Args_Obj* oa = obj_cast<Args_Obj>(out, K_ARGS, "CBInvokeMethod");
     if ((in && !ia) || (out && !oa))
     {
         set_rc(rc, CMPI_RC_ERR_INVALID_HANDLE);
@@ -518,14 +528,13 @@ CMPIData b_invoke(const CMPIBroker* mb, const CMPIContext* ctx, const CMPIObject
     Value ret;
     std::vector<Property> outs;
     std::string msg;
-    CMPIrc code = host_of(mb)->do_invoke(p->data, method, ia ? ia->data : std::vector<Property>(),
-                                         ret, outs, msg);
+    CMPIrc code = host_of(mb)->do_invoke(
+        p, method, ia ? read_args(ia, "CBInvokeMethod") : std::vector<Property>(), ret, outs, msg);
     set_rc(rc, code);
     if (code != CMPI_RC_OK)
         return null_data();
     if (oa)
-        for (const Property& o : outs)
-            oa->data.push_back(o);
+        add_args(oa, outs);
     return to_cmpi(ret);
 }
 
@@ -548,17 +557,14 @@ CMPIData b_get_property(const CMPIBroker*, const CMPIContext*, const CMPIObjectP
 
 CMPIInstance* e_new_instance(const CMPIBroker* mb, const CMPIObjectPath* op, CMPIStatus* rc)
 {
-    Path_Obj* p = obj_cast<Path_Obj>(op, K_PATH);
+    Path_Obj* p = obj_cast<Path_Obj>(op, K_PATH, "CMNewInstance");
     if (!host_of(mb) || !p)
     {
         set_rc(rc, op ? CMPI_RC_ERR_INVALID_HANDLE : CMPI_RC_ERR_INVALID_PARAMETER);
         return nullptr;
     }
-    Instance inst;
-    inst.class_name = p->data.class_name;
-    inst.path = p->data;
     set_rc(rc, CMPI_RC_OK);
-    return new_instance(inst);
+    return new_instance_of(p);
 }
 
 CMPIObjectPath* e_new_path(const CMPIBroker* mb, const char* ns, const char* cn, CMPIStatus* rc)
@@ -660,31 +666,15 @@ CMPIBoolean e_class_path_is_a(const CMPIBroker* mb, const CMPIObjectPath* op, co
         return 0;
     }
     set_rc(rc, CMPI_RC_OK);
-    return h->cat.is_a(p->data.class_name, type) || name_eq(p->data.class_name, type);
-}
-
-const char* kind_name(Kind k)
-{
-    switch (k)
-    {
-    case K_CONTEXT: return "CMPIContext";
-    case K_RESULT: return "CMPIResult";
-    case K_INSTANCE: return "CMPIInstance";
-    case K_PATH: return "CMPIObjectPath";
-    case K_ARGS: return "CMPIArgs";
-    case K_STRING: return "CMPIString";
-    case K_ARRAY: return "CMPIArray";
-    case K_ENUM: return "CMPIEnumeration";
-    case K_DATETIME: return "CMPIDateTime";
-    case K_SELECTEXP: return "CMPISelectExp";
-    }
-    return "";
+    return h->cat.is_a(p->class_name, type) || name_eq(p->class_name, type);
 }
 
 const Obj* live_obj(const void* p)
 {
     const Obj* o = static_cast<const Obj*>(p);
-    return o && o->magic == 0xC1A0B0E5u && o->hdl == o ? o : nullptr;
+    if (o && o->magic == OBJ_RELEASED && o->hdl == o)
+        used_after_release(o, "a broker call");
+    return o && o->magic == OBJ_LIVE && o->hdl == o ? o : nullptr;
 }
 
 CMPIString* e_to_string(const CMPIBroker*, const void* object, CMPIStatus* rc)
@@ -698,29 +688,26 @@ CMPIString* e_to_string(const CMPIBroker*, const void* object, CMPIStatus* rc)
     std::string text;
     switch (o->kind)
     {
-    case K_INSTANCE: text = instance_mof(static_cast<const Inst_Obj*>(o)->data); break;
-    case K_PATH: text = static_cast<const Path_Obj*>(o)->data.to_string(); break;
+    case K_INSTANCE:
+        text = instance_mof(read_instance(static_cast<const Inst_Obj*>(o), "CDToString"));
+        break;
+    case K_PATH: text = read_path(static_cast<const Path_Obj*>(o), "CDToString").to_string(); break;
     case K_STRING: text = static_cast<const String_Obj*>(o)->s; break;
     case K_DATETIME: text = static_cast<const DT_Obj*>(o)->text; break;
     case K_SELECTEXP: text = static_cast<const Select_Obj*>(o)->query; break;
     case K_ARGS:
     case K_CONTEXT:
     {
-        const std::vector<Property>& v = o->kind == K_ARGS
-                                             ? static_cast<const Args_Obj*>(o)->data
-                                             : static_cast<const Ctx_Obj*>(o)->entries;
+        const std::vector<Property> v =
+            o->kind == K_ARGS ? read_args(static_cast<const Args_Obj*>(o), "CDToString")
+                              : static_cast<const Ctx_Obj*>(o)->entries;
         for (const Property& p : v)
             text += (text.empty() ? "" : ", ") + p.name + "=" + p.value.text();
         break;
     }
     case K_ARRAY:
     {
-        const Array_Obj* a = static_cast<const Array_Obj*>(o);
-        Value v;
-        v.type = CMPIType(a->el | CMPI_ARRAY);
-        v.null = false;
-        v.elements = a->items;
-        text = v.text();
+        text = read_array(static_cast<const Array_Obj*>(o), "CDToString").text();
         break;
     }
     default: text = kind_name(o->kind); break;
@@ -1206,7 +1193,7 @@ Instance Host_Impl::interop_instance() const
         Property {"ElementName", Value::of_string("cimhost")},
         Property {"Description", Value::of_string("cimhost stand-in CIM object manager")},
     };
-    i.path.name_space = INTEROP_NS;
+    i.path.name_space = opts.interop_namespace;
     i.path.class_name = i.class_name;
     for (size_t k = 0; k < 4; k++)
         i.path.keys.push_back(i.properties[k]);
@@ -1258,10 +1245,16 @@ CMPIrc Host_Impl::do_enum(Object_Path cls, const char** props, bool names,
         p.name_space = cls.name_space;
         p.class_name = e->class_name;
         Collector c;
-        CMPIStatus st = names ? MI_CALL(mi, enumerateInstanceNames, context(cls.name_space),
-                                                               new_result(&c), new_path(p))
-                              : MI_CALL(mi, enumerateInstances, context(cls.name_space),
-                                                           new_result(&c), new_path(p), props);
+        CMPIStatus st;
+        std::string text;
+        {
+            Op_Scope request;
+            st = names ? MI_CALL(mi, enumerateInstanceNames, context(cls.name_space),
+                                 new_result(&c), new_path(p))
+                       : MI_CALL(mi, enumerateInstances, context(cls.name_space), new_result(&c),
+                                 new_path(p), props);
+            text = status_text(st);
+        }
         fill_from(out, c);
         // Asked on behalf of a superclass, a provider that can't enumerate
         // costs nothing; asked for its own class, it answers.
@@ -1269,7 +1262,7 @@ CMPIrc Host_Impl::do_enum(Object_Path cls, const char** props, bool names,
             first_error == CMPI_RC_OK)
         {
             first_error = st.rc;
-            msg = status_text(st);
+            msg = text;
         }
     }
     return first_error;
@@ -1306,13 +1299,16 @@ CMPIrc Host_Impl::do_get(Object_Path path, const char** props, Value& out, std::
     if (!mi)
         return rc;
     Collector c;
-    CMPIStatus st = MI_CALL(mi, getInstance, context(path.name_space), new_result(&c),
-                                        new_path(path), props);
-    if (st.rc != CMPI_RC_OK)
+    CMPIStatus st;
     {
+        Op_Scope request;
+        st = MI_CALL(mi, getInstance, context(path.name_space), new_result(&c), new_path(path),
+                     props);
         msg = status_text(st);
-        return st.rc;
     }
+    if (st.rc != CMPI_RC_OK)
+        return st.rc;
+    msg.clear();
     for (const Value& v : c.items)
         if (v.type == CMPI_instance && v.inst)
         {
@@ -1338,9 +1334,13 @@ CMPIrc Host_Impl::do_create(Object_Path path, const Instance& inst, Object_Path&
     if (!mi)
         return rc;
     Collector c;
-    CMPIStatus st = MI_CALL(mi, createInstance, context(path.name_space), new_result(&c),
-                                           new_path(path), new_instance(inst));
-    msg = status_text(st);
+    CMPIStatus st;
+    {
+        Op_Scope request;
+        st = MI_CALL(mi, createInstance, context(path.name_space), new_result(&c), new_path(path),
+                     new_instance(inst));
+        msg = status_text(st);
+    }
     if (st.rc == CMPI_RC_OK)
     {
         made = path;
@@ -1366,8 +1366,9 @@ CMPIrc Host_Impl::do_modify(Object_Path path, const Instance& inst, const char**
     if (!mi)
         return rc;
     Collector c;
+    Op_Scope request;
     CMPIStatus st = MI_CALL(mi, modifyInstance, context(path.name_space), new_result(&c),
-                                           new_path(path), new_instance(inst), props);
+                            new_path(path), new_instance(inst), props);
     msg = status_text(st);
     return st.rc;
 }
@@ -1386,6 +1387,7 @@ CMPIrc Host_Impl::do_delete(Object_Path path, std::string& msg)
     if (!mi)
         return rc;
     Collector c;
+    Op_Scope request;
     CMPIStatus st =
         MI_CALL(mi, deleteInstance, context(path.name_space), new_result(&c), new_path(path));
     msg = status_text(st);
@@ -1407,9 +1409,13 @@ CMPIrc Host_Impl::do_query(Object_Path cls, const std::string& query, const std:
     if (!mi)
         return rc;
     Collector c;
-    CMPIStatus st = MI_CALL(mi, execQuery, context(cls.name_space), new_result(&c), new_path(cls),
-                                      query.c_str(), lang.c_str());
-    msg = status_text(st);
+    CMPIStatus st;
+    {
+        Op_Scope request;
+        st = MI_CALL(mi, execQuery, context(cls.name_space), new_result(&c), new_path(cls),
+                     query.c_str(), lang.c_str());
+        msg = status_text(st);
+    }
     fill_from(out, c);
     return st.rc;
 }
@@ -1472,6 +1478,7 @@ CMPIrc Host_Impl::do_assoc(Assoc_Op op, Object_Path path, const std::string& ass
             continue;
         }
         Collector c;
+        Op_Scope request;
         CMPIContext* ctx = context(path.name_space);
         CMPIResult* res = new_result(&c);
         CMPIObjectPath* cp = new_path(path);
@@ -1529,16 +1536,18 @@ CMPIrc Host_Impl::do_invoke(Object_Path path, const std::string& method,
     if (!mi)
         return rc;
     Collector c;
+    Op_Scope request;
     CMPIArgs* out_args = new_args({});
     CMPIStatus st = MI_CALL(mi, invokeMethod, context(path.name_space), new_result(&c),
-                                         new_path(path), method.c_str(), new_args(in), out_args);
+                            new_path(path), method.c_str(), new_args(in), out_args);
     msg = status_text(st);
     if (st.rc != CMPI_RC_OK)
         return st.rc;
     if (!c.items.empty())
         ret = c.items[0];
-    if (Args_Obj* oa = obj_cast<Args_Obj>(out_args, K_ARGS))
-        outs = oa->data;
+    // The server reads the output arguments once the provider has returned.
+    if (Args_Obj* oa = obj_cast<Args_Obj>(out_args, K_ARGS, "invokeMethod's out arguments"))
+        outs = read_args(oa, "invokeMethod's out arguments");
     return CMPI_RC_OK;
 }
 
@@ -1761,6 +1770,16 @@ void Host::set_interop(bool on, bool empty)
 {
     impl->opts.interop = on;
     impl->opts.interop_empty = empty;
+}
+
+void Host::set_interop_namespace(const std::string& name_space)
+{
+    impl->opts.interop_namespace = name_space;
+}
+
+void Host::set_pegasus_enumerations(bool on)
+{
+    impl->opts.pegasus_enumerations = on;
 }
 
 static Result not_loaded(const Host_Impl* h)

@@ -86,8 +86,13 @@ const char usage_text[] =
     "      cimhost an --role Dependent --result-role Antecedent PATH\n"
     "  --seconds N           how long listen waits (default 10)\n"
     "      cimhost listen root/vespera:VESPERA_AlertIndication --seconds 5\n"
-    "  --no-interop          don't serve root/PG_InterOp from the built-in object manager\n"
+    "  --no-interop          don't serve the interop namespace from the built-in object manager\n"
     "      cimhost --no-interop ei root/vespera:VESPERA_ObjectManager\n"
+    "  --interop-namespace NS  the interop namespace (default root/PG_InterOp, as\n"
+    "                        OpenPegasus; SFCB's is root/interop)\n"
+    "      cimhost --interop-namespace root/interop ei root/vespera:VESPERA_Namespace\n"
+    "  --pegasus-enumerations  hand back the instances of up-calls' enumerations as\n"
+    "                        OpenPegasus does: marked null, with a good pointer\n"
     "  --help                this text\n"
     "\n"
     "Exit status: 0 success; 1 the operation failed (the CMPI return code's name is\n"
@@ -168,6 +173,8 @@ struct Args
     std::string module, reg;
     bool json = false;
     bool interop = true;
+    std::string interop_namespace = "root/PG_InterOp";
+    bool pegasus_enumerations = false;
     std::string verb;
     std::vector<std::string> positional;
     bool has_props = false;
@@ -199,8 +206,9 @@ std::vector<std::string> split_list(const std::string& s)
 Args read_args(int argc, char** argv)
 {
     Args a;
-    static const char* const valued[] = {"--module", "--reg", "--props", "--assoc-class",
-                                         "--result-class", "--role", "--result-role", "--seconds"};
+    static const char* const valued[] = {"--module",       "--reg",         "--props",
+                                         "--assoc-class",  "--result-class", "--role",
+                                         "--result-role",  "--seconds",     "--interop-namespace"};
     for (int i = 1; i < argc; i++)
     {
         std::string s = argv[i];
@@ -240,6 +248,8 @@ Args read_args(int argc, char** argv)
                 a.role = val;
             else if (opt == "--result-role")
                 a.result_role = val;
+            else if (opt == "--interop-namespace")
+                a.interop_namespace = val;
             else
             {
                 char* end = nullptr;
@@ -253,6 +263,8 @@ Args read_args(int argc, char** argv)
             a.json = true;
         else if (s == "--no-interop")
             a.interop = false;
+        else if (s == "--pegasus-enumerations")
+            a.pegasus_enumerations = true;
         else if (s.compare(0, 2, "--") == 0 && a.verb != "cm")
             bad("unknown option " + s);
         else if (a.verb.empty())
@@ -436,6 +448,8 @@ int run(int argc, char** argv)
 #ifdef CIMHOST_CLASSES
     opts.classes = &CIMHOST_CLASSES;
 #endif
+    opts.interop_namespace = a.interop_namespace;
+    opts.pegasus_enumerations = a.pegasus_enumerations;
     Host host(opts);
     if (!host.ok())
     {

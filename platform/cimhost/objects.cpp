@@ -12,12 +12,14 @@ namespace cimhost
 namespace
 {
 
-const uint32_t LIVE = 0xC1A0B0E5u;
-
 std::mutex arena_mutex;
 Arena the_host_arena;
 size_t live_objects = 0;
 thread_local std::vector<Arena*> arenas;
+
+// Released objects are kept poisoned until their scope ends; a scope that
+// never ends (a long-lived provider thread) forgets the oldest beyond this.
+const size_t MAX_HUSKS = 100000;
 
 void link(Obj* o, Arena* a)
 {
@@ -34,7 +36,6 @@ void link(Obj* o, Arena* a)
 
 void unlink(Obj* o)
 {
-    std::lock_guard<std::mutex> g(arena_mutex);
     Arena* a = o->arena;
     if (o->prev)
         o->prev->next = o->next;
@@ -44,6 +45,42 @@ void unlink(Obj* o)
         o->next->prev = o->prev;
     a->count--;
     live_objects--;
+}
+
+void unlink_husk(Obj* o)
+{
+    Arena* a = o->arena;
+    if (o->prev)
+        o->prev->next = o->next;
+    else
+        a->husks = o->next;
+    if (o->next)
+        o->next->prev = o->prev;
+    else
+        a->oldest_husk = o->prev;
+    a->husk_count--;
+}
+
+// Moves a live object to the husks of its arena; gives back the oldest husk
+// if there are too many, for the caller to free.
+Obj* bury(Obj* o)
+{
+    std::lock_guard<std::mutex> g(arena_mutex);
+    Arena* a = o->arena;
+    unlink(o);
+    o->prev = nullptr;
+    o->next = a->husks;
+    if (a->husks)
+        a->husks->prev = o;
+    else
+        a->oldest_husk = o;
+    a->husks = o;
+    a->husk_count++;
+    if (a->husk_count <= MAX_HUSKS)
+        return nullptr;
+    Obj* old = a->oldest_husk;
+    unlink_husk(old);
+    return old;
 }
 
 void delete_obj(Obj* o)
@@ -70,7 +107,7 @@ T* make(Kind k, void* ft, Arena* arena = nullptr)
     T* o = new T;
     o->hdl = o;
     o->ft = ft;
-    o->magic = LIVE;
+    o->magic = OBJ_LIVE;
     o->kind = k;
     link(o, arena ? arena : current_arena());
     return o;
@@ -80,6 +117,76 @@ template <class T>
 T* as(const void* p, Kind k)
 {
     return obj_cast<T>(p, k);
+}
+
+std::string quoted(const std::string& s)
+{
+    return "\"" + (s.size() > 60 ? s.substr(0, 57) + "..." : s) + "\"";
+}
+
+std::string step(const std::string& where, const std::string& s)
+{
+    return where.empty() ? s : where + " > " + s;
+}
+
+// What an object is, without reading what it points to.
+std::string describe(const Obj* o)
+{
+    std::string d = kind_name(o->kind);
+    switch (o->kind)
+    {
+    case K_STRING:
+    {
+        const String_Obj* s = static_cast<const String_Obj*>(o);
+        return d + " " + (s->is_null ? std::string("NULL") : quoted(s->s));
+    }
+    case K_DATETIME: return d + " " + static_cast<const DT_Obj*>(o)->text;
+    case K_ARRAY:
+    {
+        const Array_Obj* a = static_cast<const Array_Obj*>(o);
+        return d + " " + type_name(a->el) + "[" + std::to_string(a->items.size()) + "]";
+    }
+    case K_INSTANCE:
+    {
+        const Inst_Obj* i = static_cast<const Inst_Obj*>(o);
+        return d + " of " + i->name_space + ":" + i->class_name;
+    }
+    case K_PATH:
+    {
+        const Path_Obj* p = static_cast<const Path_Obj*>(o);
+        d += " " + p->name_space + ":" + p->class_name;
+        for (size_t i = 0; i < p->keys.size(); i++)
+            d += (i ? "," : ".") + p->keys[i].name + "=" +
+                 (p->keys[i].held.obj ? std::string("...") : key_value_text(p->keys[i].held.value));
+        return d;
+    }
+    case K_ARGS:
+    {
+        const Args_Obj* a = static_cast<const Args_Obj*>(o);
+        d += " (";
+        for (size_t i = 0; i < a->args.size(); i++)
+            d += (i ? ", " : "") + a->args[i].name;
+        return d + ")";
+    }
+    case K_SELECTEXP: return d + " " + quoted(static_cast<const Select_Obj*>(o)->query);
+    default: return d;
+    }
+}
+
+// A husk keeps its head and its description only.
+void clear_payload(Obj* o)
+{
+    switch (o->kind)
+    {
+    case K_CONTEXT: static_cast<Ctx_Obj*>(o)->entries.clear(); break;
+    case K_INSTANCE: static_cast<Inst_Obj*>(o)->props.clear(); break;
+    case K_PATH: static_cast<Path_Obj*>(o)->keys.clear(); break;
+    case K_ARGS: static_cast<Args_Obj*>(o)->args.clear(); break;
+    case K_STRING: static_cast<String_Obj*>(o)->s.clear(); break;
+    case K_ARRAY: static_cast<Array_Obj*>(o)->items.clear(); break;
+    case K_ENUM: static_cast<Enum_Obj*>(o)->items.clear(); break;
+    default: break;
+    }
 }
 
 CMPIStatus release_any(const void* p)
@@ -106,6 +213,16 @@ const Property* find_prop(const std::vector<Property>& v, const char* name)
     return nullptr;
 }
 
+const Held_Property* find_held(const std::vector<Held_Property>& v, const char* name)
+{
+    if (!name)
+        return nullptr;
+    for (const Held_Property& p : v)
+        if (name_eq(p.name, name))
+            return &p;
+    return nullptr;
+}
+
 // Replaces or appends.
 void put_prop(std::vector<Property>& v, const char* name, const Value& value)
 {
@@ -116,6 +233,24 @@ void put_prop(std::vector<Property>& v, const char* name, const Value& value)
             return;
         }
     v.push_back(Property {name, value});
+}
+
+void put_held(std::vector<Held_Property>& v, const std::string& name, const Held& held)
+{
+    for (Held_Property& p : v)
+        if (name_eq(p.name, name))
+        {
+            p.held = held;
+            return;
+        }
+    v.push_back(Held_Property {name, held});
+}
+
+Held copy_of(const Value& v)
+{
+    Held h;
+    h.value = v;
+    return h;
 }
 
 CMPIData get_named(const std::vector<Property>& v, const char* name, CMPIStatus* rc,
@@ -147,13 +282,42 @@ CMPIData get_at(const std::vector<Property>& v, CMPICount i, CMPIString** name, 
     return to_cmpi(v[i].value);
 }
 
+CMPIData get_held_named(const std::vector<Held_Property>& v, const char* name, CMPIStatus* rc,
+                        const std::string& where)
+{
+    const Held_Property* p = find_held(v, name);
+    if (!p)
+    {
+        set_rc(rc, name ? CMPI_RC_ERR_NO_SUCH_PROPERTY : CMPI_RC_ERR_INVALID_PARAMETER);
+        return bad_data(CMPI_notFound);
+    }
+    set_rc(rc, CMPI_RC_OK);
+    return to_cmpi(resolve(p->held, step(where, p->name)));
+}
+
+CMPIData get_held_at(const std::vector<Held_Property>& v, CMPICount i, CMPIString** name,
+                     CMPIStatus* rc, const std::string& where)
+{
+    if (i >= v.size())
+    {
+        set_rc(rc, CMPI_RC_ERR_NO_SUCH_PROPERTY);
+        if (name)
+            *name = nullptr;
+        return bad_data(CMPI_notFound);
+    }
+    if (name)
+        *name = new_string(v[i].name.c_str());
+    set_rc(rc, CMPI_RC_OK);
+    return to_cmpi(resolve(v[i].held, step(where, v[i].name)));
+}
+
 CMPIType norm(CMPIType t)
 {
     return t == CMPI_chars ? CMPIType(CMPI_string) : t;
 }
 
 //
-// Context
+// Context: its entries are copies.
 //
 
 CMPIStatus ctx_release(CMPIContext* c) { return release_any(c); }
@@ -202,7 +366,7 @@ CMPIStatus ctx_add(const CMPIContext* c, const char* name, const CMPIValue* v, C
     if (!name)
         return status(CMPI_RC_ERR_INVALID_PARAMETER);
     Value val;
-    CMPIrc rc = from_cmpi(v, t, val);
+    CMPIrc rc = from_cmpi(v, t, val, "CMAddContextEntry");
     if (rc != CMPI_RC_OK)
         return status(rc);
     put_prop(o->entries, name, val);
@@ -213,7 +377,7 @@ CMPIContextFT context_ft = {100, ctx_release, ctx_clone, ctx_get_entry, ctx_get_
                             ctx_count, ctx_add};
 
 //
-// Result
+// Result: what a provider returns is consumed, and so read, at the call.
 //
 
 CMPIStatus res_release(CMPIResult* r) { return release_any(r); }
@@ -237,7 +401,7 @@ CMPIStatus res_add(const CMPIResult* r, const Value& v)
 CMPIStatus res_data(const CMPIResult* r, const CMPIValue* v, CMPIType t)
 {
     Value val;
-    CMPIrc rc = from_cmpi(v, t, val);
+    CMPIrc rc = from_cmpi(v, t, val, "CMReturnData");
     if (rc != CMPI_RC_OK)
         return status(rc);
     return res_add(r, val);
@@ -245,20 +409,18 @@ CMPIStatus res_data(const CMPIResult* r, const CMPIValue* v, CMPIType t)
 
 CMPIStatus res_instance(const CMPIResult* r, const CMPIInstance* i)
 {
-    Inst_Obj* o = as<Inst_Obj>(i, K_INSTANCE);
+    Inst_Obj* o = obj_cast<Inst_Obj>(i, K_INSTANCE, "CMReturnInstance");
     if (!o)
         return status(i ? CMPI_RC_ERR_INVALID_HANDLE : CMPI_RC_ERR_INVALID_PARAMETER);
-    Instance copy = o->data;
-    copy.path = instance_path(o->data);
-    return res_add(r, Value::of_instance(copy));
+    return res_add(r, Value::of_instance(read_instance(o, "CMReturnInstance")));
 }
 
 CMPIStatus res_path(const CMPIResult* r, const CMPIObjectPath* p)
 {
-    Path_Obj* o = as<Path_Obj>(p, K_PATH);
+    Path_Obj* o = obj_cast<Path_Obj>(p, K_PATH, "CMReturnObjectPath");
     if (!o)
         return status(p ? CMPI_RC_ERR_INVALID_HANDLE : CMPI_RC_ERR_INVALID_PARAMETER);
-    return res_add(r, Value::of_ref(o->data));
+    return res_add(r, Value::of_ref(read_path(o, "CMReturnObjectPath")));
 }
 
 CMPIStatus res_done(const CMPIResult* r)
@@ -279,17 +441,29 @@ CMPIResultFT result_ft = {100, res_release, res_clone, res_data, res_instance, r
 
 CMPIStatus inst_release(CMPIInstance* i) { return release_any(i); }
 
+std::string where_in(const Inst_Obj* o, const char* call)
+{
+    return std::string(call) + " > CMPIInstance of " + o->class_name;
+}
+
 CMPIInstance* inst_clone(const CMPIInstance* i, CMPIStatus* rc)
 {
     Inst_Obj* o = as<Inst_Obj>(i, K_INSTANCE);
     set_rc(rc, o ? CMPI_RC_OK : CMPI_RC_ERR_INVALID_HANDLE);
     if (!o)
         return nullptr;
-    CMPIInstance* c = new_instance(o->data);
-    Inst_Obj* n = as<Inst_Obj>(c, K_INSTANCE);
+    // A clone is a copy of what the instance holds now.
+    Inst_Obj* n = make<Inst_Obj>(K_INSTANCE, o->ft);
+    n->class_name = o->class_name;
+    n->host = o->host;
+    n->name_space = o->name_space;
+    n->key_names = o->key_names;
     n->filtered = o->filtered;
     n->filter = o->filter;
-    return c;
+    std::string where = where_in(o, "CMClone");
+    for (const Held_Property& p : o->props)
+        n->props.push_back(Held_Property {p.name, copy_of(resolve(p.held, step(where, p.name)))});
+    return reinterpret_cast<CMPIInstance*>(n);
 }
 
 CMPIData inst_get(const CMPIInstance* i, const char* name, CMPIStatus* rc)
@@ -300,7 +474,7 @@ CMPIData inst_get(const CMPIInstance* i, const char* name, CMPIStatus* rc)
         set_rc(rc, CMPI_RC_ERR_INVALID_HANDLE);
         return bad_data(CMPI_badValue);
     }
-    return get_named(o->data.properties, name, rc, CMPI_RC_ERR_NO_SUCH_PROPERTY);
+    return get_held_named(o->props, name, rc, where_in(o, "CMGetProperty"));
 }
 
 CMPIData inst_get_at(const CMPIInstance* i, CMPICount n, CMPIString** name, CMPIStatus* rc)
@@ -311,26 +485,20 @@ CMPIData inst_get_at(const CMPIInstance* i, CMPICount n, CMPIString** name, CMPI
         set_rc(rc, CMPI_RC_ERR_INVALID_HANDLE);
         return bad_data(CMPI_badValue);
     }
-    return get_at(o->data.properties, n, name, rc, CMPI_RC_ERR_NO_SUCH_PROPERTY);
+    return get_held_at(o->props, n, name, rc, where_in(o, "CMGetPropertyAt"));
 }
 
 CMPICount inst_count(const CMPIInstance* i, CMPIStatus* rc)
 {
     Inst_Obj* o = as<Inst_Obj>(i, K_INSTANCE);
     set_rc(rc, o ? CMPI_RC_OK : CMPI_RC_ERR_INVALID_HANDLE);
-    return o ? CMPICount(o->data.properties.size()) : 0;
+    return o ? CMPICount(o->props.size()) : 0;
 }
 
-bool is_key_of(const Instance& inst, const std::string& name)
-{
-    if (inst.path.key(name))
-        return true;
-    const Catalogue* cat = host_catalogue();
-    const Class_Info* ci = cat ? cat->find(inst.class_name) : nullptr;
-    const Feature_Info* f = ci ? ci->feature(name) : nullptr;
-    return f && f->key;
-}
-
+// With a filter, only the properties it names stay: those of the list and
+// those of the key list the provider gave. The class's keys get no favour,
+// as a server that builds the path from the key properties left on the
+// instance gives none.
 bool passes_filter(const Inst_Obj* o, const std::string& name)
 {
     if (!o->filtered)
@@ -338,7 +506,7 @@ bool passes_filter(const Inst_Obj* o, const std::string& name)
     for (const std::string& f : o->filter)
         if (name_eq(f, name))
             return true;
-    return is_key_of(o->data, name);
+    return false;
 }
 
 CMPIStatus inst_set(const CMPIInstance* i, const char* name, const CMPIValue* v, CMPIType t)
@@ -348,20 +516,20 @@ CMPIStatus inst_set(const CMPIInstance* i, const char* name, const CMPIValue* v,
         return status(CMPI_RC_ERR_INVALID_HANDLE);
     if (!name || !*name)
         return status(CMPI_RC_ERR_INVALID_PARAMETER);
-    Value val;
-    CMPIrc rc = from_cmpi(v, t, val);
+    Held val;
+    CMPIrc rc = hold(v, t, val, std::string("CMSetProperty of ") + name);
     if (rc != CMPI_RC_OK)
         return status(rc);
     // A server takes only what the class in its repository declares, and
     // with the declared type, property list or not.
     const Catalogue* cat = host_catalogue();
-    rc = cat ? cat->check_property(o->data.class_name, name, val.type) : CMPI_RC_OK;
+    rc = cat ? cat->check_property(o->class_name, name, val.value.type) : CMPI_RC_OK;
     if (rc != CMPI_RC_OK)
         return status(rc);
     // A filtered-out property is dropped silently, as the client asked for
     // fewer properties, not for an error.
     if (passes_filter(o, name))
-        put_prop(o->data.properties, name, val);
+        put_held(o->props, name, val);
     return status(CMPI_RC_OK);
 }
 
@@ -369,7 +537,7 @@ CMPIObjectPath* inst_get_path(const CMPIInstance* i, CMPIStatus* rc)
 {
     Inst_Obj* o = as<Inst_Obj>(i, K_INSTANCE);
     set_rc(rc, o ? CMPI_RC_OK : CMPI_RC_ERR_INVALID_HANDLE);
-    return o ? new_path(instance_path(o->data)) : nullptr;
+    return o ? new_path(read_instance(o, "CMGetObjectPath").path) : nullptr;
 }
 
 CMPIStatus inst_set_filter(CMPIInstance* i, const char** props, const char** keys)
@@ -389,12 +557,29 @@ CMPIStatus inst_set_filter(CMPIInstance* i, const char** props, const char** key
         o->filter.push_back(props[n]);
     for (size_t n = 0; keys && keys[n]; n++)
         o->filter.push_back(keys[n]);
-    std::vector<Property> kept;
-    for (const Property& p : o->data.properties)
+    std::vector<Held_Property> kept;
+    for (const Held_Property& p : o->props)
         if (passes_filter(o, p.name))
             kept.push_back(p);
-    o->data.properties.swap(kept);
+    o->props.swap(kept);
     return status(CMPI_RC_OK);
+}
+
+// The path's namespace, class and keys; its keys become properties, as
+// they do when an instance is made from a path.
+void take_path(Inst_Obj* o, const Path_Obj* p)
+{
+    o->host = p->host;
+    o->name_space = p->name_space;
+    if (!p->class_name.empty())
+        o->class_name = p->class_name;
+    o->key_names.clear();
+    for (const Held_Property& k : p->keys)
+    {
+        o->key_names.push_back(k.name);
+        if (passes_filter(o, k.name))
+            put_held(o->props, k.name, k.held);
+    }
 }
 
 CMPIStatus inst_set_path(CMPIInstance* i, const CMPIObjectPath* p)
@@ -405,9 +590,7 @@ CMPIStatus inst_set_path(CMPIInstance* i, const CMPIObjectPath* p)
         return status(CMPI_RC_ERR_INVALID_HANDLE);
     if (!po)
         return status(CMPI_RC_ERR_INVALID_PARAMETER);
-    o->data.path = po->data;
-    if (!po->data.class_name.empty())
-        o->data.class_name = po->data.class_name;
+    take_path(o, po);
     return status(CMPI_RC_OK);
 }
 
@@ -425,49 +608,48 @@ CMPIObjectPath* path_clone(const CMPIObjectPath* p, CMPIStatus* rc)
 {
     Path_Obj* o = as<Path_Obj>(p, K_PATH);
     set_rc(rc, o ? CMPI_RC_OK : CMPI_RC_ERR_INVALID_HANDLE);
-    return o ? new_path(o->data) : nullptr;
+    return o ? new_path(read_path(o, "CMClone")) : nullptr;
 }
 
-CMPIStatus path_set_text(CMPIObjectPath* p, const char* s, std::string Object_Path::*field)
+CMPIStatus path_set_text(CMPIObjectPath* p, const char* s, std::string Path_Obj::*field)
 {
     Path_Obj* o = as<Path_Obj>(p, K_PATH);
     if (!o)
         return status(CMPI_RC_ERR_INVALID_HANDLE);
-    o->data.*field = s ? s : "";
+    o->*field = s ? s : "";
     return status(CMPI_RC_OK);
 }
 
-CMPIString* path_get_text(const CMPIObjectPath* p, CMPIStatus* rc,
-                          std::string Object_Path::*field)
+CMPIString* path_get_text(const CMPIObjectPath* p, CMPIStatus* rc, std::string Path_Obj::*field)
 {
     Path_Obj* o = as<Path_Obj>(p, K_PATH);
     set_rc(rc, o ? CMPI_RC_OK : CMPI_RC_ERR_INVALID_HANDLE);
-    return o ? new_string((o->data.*field).c_str()) : nullptr;
+    return o ? new_string((o->*field).c_str()) : nullptr;
 }
 
 CMPIStatus path_set_ns(CMPIObjectPath* p, const char* s)
 {
-    return path_set_text(p, s, &Object_Path::name_space);
+    return path_set_text(p, s, &Path_Obj::name_space);
 }
 CMPIString* path_get_ns(const CMPIObjectPath* p, CMPIStatus* rc)
 {
-    return path_get_text(p, rc, &Object_Path::name_space);
+    return path_get_text(p, rc, &Path_Obj::name_space);
 }
 CMPIStatus path_set_host(CMPIObjectPath* p, const char* s)
 {
-    return path_set_text(p, s, &Object_Path::host);
+    return path_set_text(p, s, &Path_Obj::host);
 }
 CMPIString* path_get_host(const CMPIObjectPath* p, CMPIStatus* rc)
 {
-    return path_get_text(p, rc, &Object_Path::host);
+    return path_get_text(p, rc, &Path_Obj::host);
 }
 CMPIStatus path_set_class(CMPIObjectPath* p, const char* s)
 {
-    return path_set_text(p, s, &Object_Path::class_name);
+    return path_set_text(p, s, &Path_Obj::class_name);
 }
 CMPIString* path_get_class(const CMPIObjectPath* p, CMPIStatus* rc)
 {
-    return path_get_text(p, rc, &Object_Path::class_name);
+    return path_get_text(p, rc, &Path_Obj::class_name);
 }
 
 CMPIStatus path_add_key(CMPIObjectPath* p, const char* name, const CMPIValue* v, CMPIType t)
@@ -477,13 +659,19 @@ CMPIStatus path_add_key(CMPIObjectPath* p, const char* name, const CMPIValue* v,
         return status(CMPI_RC_ERR_INVALID_HANDLE);
     if (!name || !*name)
         return status(CMPI_RC_ERR_INVALID_PARAMETER);
-    Value val;
-    CMPIrc rc = from_cmpi(v, t, val);
+    Held val;
+    CMPIrc rc = hold(v, t, val, std::string("CMAddKey of ") + name);
     if (rc != CMPI_RC_OK)
         return status(rc);
-    widen_key(val);
-    put_prop(o->data.keys, name, val);
+    if (!val.obj)
+        widen_key(val.value);
+    put_held(o->keys, name, val);
     return status(CMPI_RC_OK);
+}
+
+std::string where_in(const Path_Obj* o, const char* call)
+{
+    return std::string(call) + " > CMPIObjectPath " + o->name_space + ":" + o->class_name;
 }
 
 CMPIData path_get_key(const CMPIObjectPath* p, const char* name, CMPIStatus* rc)
@@ -494,7 +682,7 @@ CMPIData path_get_key(const CMPIObjectPath* p, const char* name, CMPIStatus* rc)
         set_rc(rc, CMPI_RC_ERR_INVALID_HANDLE);
         return bad_data(CMPI_badValue);
     }
-    CMPIData d = get_named(o->data.keys, name, rc, CMPI_RC_ERR_NO_SUCH_PROPERTY);
+    CMPIData d = get_held_named(o->keys, name, rc, where_in(o, "CMGetKey"));
     if (!(d.state & CMPI_notFound))
         d.state |= CMPI_keyValue;
     return d;
@@ -508,7 +696,7 @@ CMPIData path_get_key_at(const CMPIObjectPath* p, CMPICount i, CMPIString** name
         set_rc(rc, CMPI_RC_ERR_INVALID_HANDLE);
         return bad_data(CMPI_badValue);
     }
-    CMPIData d = get_at(o->data.keys, i, name, rc, CMPI_RC_ERR_NO_SUCH_PROPERTY);
+    CMPIData d = get_held_at(o->keys, i, name, rc, where_in(o, "CMGetKeyAt"));
     if (!(d.state & CMPI_notFound))
         d.state |= CMPI_keyValue;
     return d;
@@ -518,7 +706,7 @@ CMPICount path_key_count(const CMPIObjectPath* p, CMPIStatus* rc)
 {
     Path_Obj* o = as<Path_Obj>(p, K_PATH);
     set_rc(rc, o ? CMPI_RC_OK : CMPI_RC_ERR_INVALID_HANDLE);
-    return o ? CMPICount(o->data.keys.size()) : 0;
+    return o ? CMPICount(o->keys.size()) : 0;
 }
 
 CMPIStatus path_ns_from(CMPIObjectPath* p, const CMPIObjectPath* src)
@@ -527,7 +715,7 @@ CMPIStatus path_ns_from(CMPIObjectPath* p, const CMPIObjectPath* src)
     Path_Obj* s = as<Path_Obj>(src, K_PATH);
     if (!o || !s)
         return status(CMPI_RC_ERR_INVALID_HANDLE);
-    o->data.name_space = s->data.name_space;
+    o->name_space = s->name_space;
     return status(CMPI_RC_OK);
 }
 
@@ -537,8 +725,8 @@ CMPIStatus path_host_ns_from(CMPIObjectPath* p, const CMPIObjectPath* src)
     Path_Obj* s = as<Path_Obj>(src, K_PATH);
     if (!o || !s)
         return status(CMPI_RC_ERR_INVALID_HANDLE);
-    o->data.name_space = s->data.name_space;
-    o->data.host = s->data.host;
+    o->name_space = s->name_space;
+    o->host = s->host;
     return status(CMPI_RC_OK);
 }
 
@@ -564,7 +752,7 @@ CMPIString* path_to_string(const CMPIObjectPath* p, CMPIStatus* rc)
 {
     Path_Obj* o = as<Path_Obj>(p, K_PATH);
     set_rc(rc, o ? CMPI_RC_OK : CMPI_RC_ERR_INVALID_HANDLE);
-    return o ? new_string(o->data.to_string().c_str()) : nullptr;
+    return o ? new_string(read_path(o, "CMObjectPathToString").to_string().c_str()) : nullptr;
 }
 
 CMPIObjectPathFT path_ft = {100,
@@ -598,7 +786,7 @@ CMPIArgs* args_clone(const CMPIArgs* a, CMPIStatus* rc)
 {
     Args_Obj* o = as<Args_Obj>(a, K_ARGS);
     set_rc(rc, o ? CMPI_RC_OK : CMPI_RC_ERR_INVALID_HANDLE);
-    return o ? new_args(o->data) : nullptr;
+    return o ? new_args(read_args(o, "CMClone")) : nullptr;
 }
 
 CMPIStatus args_add(const CMPIArgs* a, const char* name, const CMPIValue* v, CMPIType t)
@@ -608,11 +796,11 @@ CMPIStatus args_add(const CMPIArgs* a, const char* name, const CMPIValue* v, CMP
         return status(CMPI_RC_ERR_INVALID_HANDLE);
     if (!name || !*name)
         return status(CMPI_RC_ERR_INVALID_PARAMETER);
-    Value val;
-    CMPIrc rc = from_cmpi(v, t, val);
+    Held val;
+    CMPIrc rc = hold(v, t, val, std::string("CMAddArg of ") + name);
     if (rc != CMPI_RC_OK)
         return status(rc);
-    put_prop(o->data, name, val);
+    put_held(o->args, name, val);
     return status(CMPI_RC_OK);
 }
 
@@ -624,7 +812,7 @@ CMPIData args_get(const CMPIArgs* a, const char* name, CMPIStatus* rc)
         set_rc(rc, CMPI_RC_ERR_INVALID_HANDLE);
         return bad_data(CMPI_badValue);
     }
-    return get_named(o->data, name, rc, CMPI_RC_ERR_NO_SUCH_PROPERTY);
+    return get_held_named(o->args, name, rc, "CMGetArg > CMPIArgs");
 }
 
 CMPIData args_get_at(const CMPIArgs* a, CMPICount i, CMPIString** name, CMPIStatus* rc)
@@ -635,14 +823,14 @@ CMPIData args_get_at(const CMPIArgs* a, CMPICount i, CMPIString** name, CMPIStat
         set_rc(rc, CMPI_RC_ERR_INVALID_HANDLE);
         return bad_data(CMPI_badValue);
     }
-    return get_at(o->data, i, name, rc, CMPI_RC_ERR_NO_SUCH_PROPERTY);
+    return get_held_at(o->args, i, name, rc, "CMGetArgAt > CMPIArgs");
 }
 
 CMPICount args_count(const CMPIArgs* a, CMPIStatus* rc)
 {
     Args_Obj* o = as<Args_Obj>(a, K_ARGS);
     set_rc(rc, o ? CMPI_RC_OK : CMPI_RC_ERR_INVALID_HANDLE);
-    return o ? CMPICount(o->data.size()) : 0;
+    return o ? CMPICount(o->args.size()) : 0;
 }
 
 CMPIArgsFT args_ft = {100, args_release, args_clone, args_add, args_get, args_get_at, args_count};
@@ -683,8 +871,10 @@ CMPIArray* arr_clone(const CMPIArray* a, CMPIStatus* rc)
     set_rc(rc, o ? CMPI_RC_OK : CMPI_RC_ERR_INVALID_HANDLE);
     if (!o)
         return nullptr;
+    Value v = read_array(o, "CMClone");
     CMPIArray* c = new_array(o->el, 0);
-    as<Array_Obj>(c, K_ARRAY)->items = o->items;
+    for (const Value& e : v.elements)
+        as<Array_Obj>(c, K_ARRAY)->items.push_back(copy_of(e));
     return c;
 }
 
@@ -716,7 +906,8 @@ CMPIData arr_get(const CMPIArray* a, CMPICount i, CMPIStatus* rc)
         return bad_data(CMPI_notFound);
     }
     set_rc(rc, CMPI_RC_OK);
-    return to_cmpi(o->items[i]);
+    return to_cmpi(resolve(o->items[i], "CMGetArrayElementAt > " + describe(o) + " > element " +
+                                            std::to_string(i)));
 }
 
 CMPIStatus arr_set(CMPIArray* a, CMPICount i, const CMPIValue* v, CMPIType t)
@@ -728,13 +919,16 @@ CMPIStatus arr_set(CMPIArray* a, CMPICount i, const CMPIValue* v, CMPIType t)
         return status(CMPI_RC_ERR_NO_SUCH_PROPERTY);
     if ((t & CMPI_ARRAY) || (norm(t) != o->el && t != CMPI_null))
         return status(CMPI_RC_ERR_TYPE_MISMATCH);
-    Value val;
-    CMPIrc rc = from_cmpi(v, t == CMPI_null ? o->el : t, val);
-    if (rc != CMPI_RC_OK)
-        return status(rc);
-    val.type = o->el;
+    Held val;
     if (t == CMPI_null)
-        val.null = true;
+        val.value = Value::null_of(o->el);
+    else
+    {
+        CMPIrc rc = hold(v, t, val, "CMSetArrayElementAt " + std::to_string(i));
+        if (rc != CMPI_RC_OK)
+            return status(rc);
+        val.value.type = o->el;
+    }
     o->items[i] = val;
     return status(CMPI_RC_OK);
 }
@@ -755,6 +949,7 @@ CMPIEnumeration* enum_clone(const CMPIEnumeration* e, CMPIStatus* rc)
         return nullptr;
     CMPIEnumeration* c = new_enum(o->items);
     as<Enum_Obj>(c, K_ENUM)->pos = o->pos;
+    as<Enum_Obj>(c, K_ENUM)->null_state = o->null_state;
     return c;
 }
 
@@ -772,7 +967,10 @@ CMPIData enum_next(const CMPIEnumeration* e, CMPIStatus* rc)
         return bad_data(CMPI_notFound);
     }
     set_rc(rc, CMPI_RC_OK);
-    return to_cmpi(o->items[o->pos++]);
+    CMPIData d = to_cmpi(o->items[o->pos++]);
+    if (o->null_state && d.type == CMPI_instance && d.value.inst)
+        d.state = CMPI_nullValue;
+    return d;
 }
 
 CMPIBoolean enum_has_next(const CMPIEnumeration* e, CMPIStatus* rc)
@@ -790,7 +988,8 @@ CMPIArray* enum_to_array(const CMPIEnumeration* e, CMPIStatus* rc)
         return nullptr;
     CMPIType el = o->items.empty() ? CMPIType(CMPI_instance) : o->items[0].type;
     CMPIArray* a = new_array(el, 0);
-    as<Array_Obj>(a, K_ARRAY)->items = o->items;
+    for (const Value& v : o->items)
+        as<Array_Obj>(a, K_ARRAY)->items.push_back(copy_of(v));
     return a;
 }
 
@@ -857,8 +1056,7 @@ CMPIBoolean se_evaluate(const CMPISelectExp* s, const CMPIInstance* i, CMPIStatu
     }
     set_rc(rc, CMPI_RC_OK);
     const Catalogue* cat = host_catalogue();
-    return cat ? cat->is_a(io->data.class_name, o->class_name)
-               : name_eq(io->data.class_name, o->class_name);
+    return cat ? cat->is_a(io->class_name, o->class_name) : name_eq(io->class_name, o->class_name);
 }
 
 CMPIString* se_string(const CMPISelectExp* s, CMPIStatus* rc)
@@ -883,7 +1081,118 @@ CMPIBoolean se_accessor(const CMPISelectExp*, CMPIAccessor*, void*, CMPIStatus* 
 CMPISelectExpFT select_ft = {100, se_release, se_clone, se_evaluate, se_string, se_cond, se_cond,
                              se_accessor};
 
+//
+// Reading what containers keep.
+//
+
+// Deeper than this, a container refers to itself.
+const int MAX_DEPTH = 64;
+
+Value resolve_at(const Held& h, const std::string& where, int depth);
+
+Instance read_instance_at(const Inst_Obj* o, const std::string& where, int depth)
+{
+    Instance inst;
+    inst.class_name = o->class_name;
+    inst.path.host = o->host;
+    inst.path.name_space = o->name_space;
+    inst.path.class_name = o->class_name;
+    for (const std::string& k : o->key_names)
+        inst.path.keys.push_back(Property {k, Value()});
+    std::string here = step(where, "CMPIInstance of " + o->class_name);
+    for (const Held_Property& p : o->props)
+        inst.properties.push_back(
+            Property {p.name, resolve_at(p.held, step(here, "property " + p.name), depth)});
+    inst.path = instance_path(inst);
+    return inst;
+}
+
+Object_Path read_path_at(const Path_Obj* o, const std::string& where, int depth)
+{
+    Object_Path p;
+    p.host = o->host;
+    p.name_space = o->name_space;
+    p.class_name = o->class_name;
+    std::string here = step(where, "CMPIObjectPath " + o->name_space + ":" + o->class_name);
+    for (const Held_Property& k : o->keys)
+        p.keys.push_back(Property {k.name, resolve_at(k.held, step(here, "key " + k.name), depth)});
+    return p;
+}
+
+Value read_array_at(const Array_Obj* o, const std::string& where, int depth)
+{
+    Value v;
+    v.type = CMPIType(o->el | CMPI_ARRAY);
+    v.null = false;
+    std::string here = step(where, "CMPIArray of " + type_name(o->el));
+    for (size_t i = 0; i < o->items.size(); i++)
+    {
+        Value e = resolve_at(o->items[i], step(here, "element " + std::to_string(i)), depth);
+        e.type = o->el;
+        v.elements.push_back(e);
+    }
+    return v;
+}
+
+Value resolve_at(const Held& h, const std::string& where, int depth)
+{
+    if (!h.obj)
+        return h.value;
+    const Obj* o = h.obj;
+    if (o->magic == OBJ_RELEASED && o->hdl == o)
+        used_after_release(o, where);
+    if (depth > MAX_DEPTH)
+    {
+        fprintf(stderr, "cimhost: %s: objects nested too deep; does one hold itself?\n",
+                where.c_str());
+        abort();
+    }
+    switch (o->kind)
+    {
+    case K_STRING:
+    {
+        const String_Obj* s = static_cast<const String_Obj*>(o);
+        return s->is_null ? Value::null_of(CMPI_string) : Value::of_string(s->s);
+    }
+    case K_DATETIME: return Value::of_datetime(static_cast<const DT_Obj*>(o)->text);
+    case K_PATH:
+        return Value::of_ref(read_path_at(static_cast<const Path_Obj*>(o), where, depth + 1));
+    case K_INSTANCE:
+        return Value::of_instance(
+            read_instance_at(static_cast<const Inst_Obj*>(o), where, depth + 1));
+    case K_ARRAY: return read_array_at(static_cast<const Array_Obj*>(o), where, depth + 1);
+    default: return h.value;
+    }
+}
+
 } // namespace
+
+[[noreturn]] void used_after_release(const Obj* o, const std::string& where)
+{
+    fprintf(stderr,
+            "cimhost: use after release: %s -> %s\n"
+            "cimhost: (the provider released it while something still referred to it)\n",
+            where.c_str(), o->released.c_str());
+    abort();
+}
+
+const char* kind_name(Kind k)
+{
+    switch (k)
+    {
+    case K_CONTEXT: return "CMPIContext";
+    case K_RESULT: return "CMPIResult";
+    case K_INSTANCE: return "CMPIInstance";
+    case K_PATH: return "CMPIObjectPath";
+    case K_ARGS: return "CMPIArgs";
+    case K_STRING: return "CMPIString";
+    case K_ARRAY: return "CMPIArray";
+    case K_ENUM: return "CMPIEnumeration";
+    case K_DATETIME: return "CMPIDateTime";
+    case K_SELECTEXP: return "CMPISelectExp";
+    }
+    return "";
+}
 
 void push_arena(Arena* a)
 {
@@ -914,10 +1223,13 @@ void free_arena(Arena* a)
         {
             std::lock_guard<std::mutex> g(arena_mutex);
             o = a->head;
+            if (o)
+                unlink(o);
+            else if ((o = a->husks))
+                unlink_husk(o);
         }
         if (!o)
             break;
-        unlink(o);
         delete_obj(o);
     }
 }
@@ -933,10 +1245,15 @@ bool release_obj(const void* p)
     if (!p)
         return false;
     Obj* o = const_cast<Obj*>(static_cast<const Obj*>(p));
-    if (o->magic != LIVE || o->hdl != o)
+    if (o->magic == OBJ_RELEASED && o->hdl == o)
+        used_after_release(o, "CMRelease (released twice)");
+    if (o->magic != OBJ_LIVE || o->hdl != o)
         return false;
-    unlink(o);
-    delete_obj(o);
+    o->released = describe(o);
+    o->magic = OBJ_RELEASED;
+    clear_payload(o);
+    if (Obj* old = bury(o))
+        delete_obj(old);
     return true;
 }
 
@@ -957,22 +1274,52 @@ CMPIResult* new_result(Collector* sink)
 CMPIInstance* new_instance(const Instance& inst)
 {
     Inst_Obj* o = make<Inst_Obj>(K_INSTANCE, &instance_ft);
-    o->data = inst;
+    o->class_name = inst.class_name.empty() ? inst.path.class_name : inst.class_name;
+    o->host = inst.path.host;
+    o->name_space = inst.path.name_space;
+    for (const Property& p : inst.properties)
+        o->props.push_back(Held_Property {p.name, copy_of(p.value)});
+    // Keys only in the path become properties, as they do when a provider
+    // makes an instance from a path.
+    for (const Property& k : inst.path.keys)
+    {
+        o->key_names.push_back(k.name);
+        if (!find_held(o->props, k.name.c_str()))
+            o->props.push_back(Held_Property {k.name, copy_of(k.value)});
+    }
+    return reinterpret_cast<CMPIInstance*>(o);
+}
+
+CMPIInstance* new_instance_of(const Path_Obj* path)
+{
+    Inst_Obj* o = make<Inst_Obj>(K_INSTANCE, &instance_ft);
+    take_path(o, path);
     return reinterpret_cast<CMPIInstance*>(o);
 }
 
 CMPIObjectPath* new_path(const Object_Path& path, Arena* arena)
 {
     Path_Obj* o = make<Path_Obj>(K_PATH, &path_ft, arena);
-    o->data = path;
+    o->host = path.host;
+    o->name_space = path.name_space;
+    o->class_name = path.class_name;
+    for (const Property& k : path.keys)
+        o->keys.push_back(Held_Property {k.name, copy_of(k.value)});
     return reinterpret_cast<CMPIObjectPath*>(o);
 }
 
 CMPIArgs* new_args(const std::vector<Property>& args)
 {
     Args_Obj* o = make<Args_Obj>(K_ARGS, &args_ft);
-    o->data = args;
+    for (const Property& a : args)
+        o->args.push_back(Held_Property {a.name, copy_of(a.value)});
     return reinterpret_cast<CMPIArgs*>(o);
+}
+
+void add_args(Args_Obj* o, const std::vector<Property>& args)
+{
+    for (const Property& a : args)
+        put_held(o->args, a.name, copy_of(a.value));
 }
 
 CMPIString* new_string(const char* s)
@@ -987,7 +1334,7 @@ CMPIArray* new_array(CMPIType el, size_t n)
 {
     Array_Obj* o = make<Array_Obj>(K_ARRAY, &array_ft);
     o->el = norm(CMPIType(el & ~CMPI_ARRAY));
-    o->items.assign(n, Value::null_of(o->el));
+    o->items.assign(n, copy_of(Value::null_of(o->el)));
     return reinterpret_cast<CMPIArray*>(o);
 }
 
@@ -1015,25 +1362,26 @@ CMPISelectExp* new_select(const std::string& query, const std::string& lang,
     return reinterpret_cast<CMPISelectExp*>(o);
 }
 
-CMPIrc from_cmpi(const CMPIValue* v, CMPIType type, Value& out)
+CMPIrc hold(const CMPIValue* v, CMPIType type, Held& out, const std::string& where)
 {
-    out = Value();
+    out = Held();
+    Value& val = out.value;
     if (type & CMPI_ARRAY)
     {
         CMPIType el = norm(CMPIType(type & ~CMPI_ARRAY));
-        out.type = CMPIType(el | CMPI_ARRAY);
+        val.type = CMPIType(el | CMPI_ARRAY);
         if (!v || !v->array)
             return CMPI_RC_OK;
-        Array_Obj* a = as<Array_Obj>(v->array, K_ARRAY);
+        Array_Obj* a = obj_cast<Array_Obj>(v->array, K_ARRAY, where.c_str());
         if (!a)
             return CMPI_RC_ERR_INVALID_HANDLE;
         if (a->el != el)
             return CMPI_RC_ERR_TYPE_MISMATCH;
-        out.null = false;
-        out.elements = a->items;
+        val.null = false;
+        out.obj = a;
         return CMPI_RC_OK;
     }
-    out.type = norm(type);
+    val.type = norm(type);
     switch (type)
     {
     case CMPI_null:
@@ -1052,80 +1400,97 @@ CMPIrc from_cmpi(const CMPIValue* v, CMPIType type, Value& out)
     case CMPI_sint64:
         if (!v)
             return CMPI_RC_OK;
-        out.null = false;
+        val.null = false;
         switch (type)
         {
-        case CMPI_boolean: out.num.boolean = v->boolean ? 1 : 0; break;
-        case CMPI_char16: out.num.char16 = v->char16; break;
-        case CMPI_real32: out.num.real32 = v->real32; break;
-        case CMPI_real64: out.num.real64 = v->real64; break;
-        case CMPI_uint8: out.num.uint8 = v->uint8; break;
-        case CMPI_uint16: out.num.uint16 = v->uint16; break;
-        case CMPI_uint32: out.num.uint32 = v->uint32; break;
-        case CMPI_uint64: out.num.uint64 = v->uint64; break;
-        case CMPI_sint8: out.num.sint8 = v->sint8; break;
-        case CMPI_sint16: out.num.sint16 = v->sint16; break;
-        case CMPI_sint32: out.num.sint32 = v->sint32; break;
-        default: out.num.sint64 = v->sint64; break;
+        case CMPI_boolean: val.num.boolean = v->boolean ? 1 : 0; break;
+        case CMPI_char16: val.num.char16 = v->char16; break;
+        case CMPI_real32: val.num.real32 = v->real32; break;
+        case CMPI_real64: val.num.real64 = v->real64; break;
+        case CMPI_uint8: val.num.uint8 = v->uint8; break;
+        case CMPI_uint16: val.num.uint16 = v->uint16; break;
+        case CMPI_uint32: val.num.uint32 = v->uint32; break;
+        case CMPI_uint64: val.num.uint64 = v->uint64; break;
+        case CMPI_sint8: val.num.sint8 = v->sint8; break;
+        case CMPI_sint16: val.num.sint16 = v->sint16; break;
+        case CMPI_sint32: val.num.sint32 = v->sint32; break;
+        default: val.num.sint64 = v->sint64; break;
         }
         return CMPI_RC_OK;
     case CMPI_chars:
-        // As SFCB does: the value pointer is the text itself, which is what
-        // the usual CMSetProperty(inst, name, "text", CMPI_chars) passes.
+        // Copied at once. As SFCB does: the value pointer is the text itself,
+        // which is what the usual CMSetProperty(inst, name, "text",
+        // CMPI_chars) passes.
         if (v)
         {
-            out.null = false;
-            out.str = reinterpret_cast<const char*>(v);
+            val.null = false;
+            val.str = reinterpret_cast<const char*>(v);
         }
         return CMPI_RC_OK;
     case CMPI_string:
-    {
-        if (!v || !v->string)
-            return CMPI_RC_OK;
-        String_Obj* s = as<String_Obj>(v->string, K_STRING);
-        if (!s)
-            return CMPI_RC_ERR_INVALID_HANDLE;
-        out.null = s->is_null;
-        out.str = s->s;
-        return CMPI_RC_OK;
-    }
     case CMPI_dateTime:
-    {
-        if (!v || !v->dateTime)
-            return CMPI_RC_OK;
-        DT_Obj* d = as<DT_Obj>(v->dateTime, K_DATETIME);
-        if (!d)
-            return CMPI_RC_ERR_INVALID_HANDLE;
-        out.null = false;
-        out.str = d->text;
-        return CMPI_RC_OK;
-    }
     case CMPI_ref:
-    {
-        if (!v || !v->ref)
-            return CMPI_RC_OK;
-        Path_Obj* p = as<Path_Obj>(v->ref, K_PATH);
-        if (!p)
-            return CMPI_RC_ERR_INVALID_HANDLE;
-        out = Value::of_ref(p->data);
-        return CMPI_RC_OK;
-    }
     case CMPI_instance:
     {
-        if (!v || !v->inst)
+        Kind k = type == CMPI_string ? K_STRING
+                 : type == CMPI_dateTime ? K_DATETIME
+                 : type == CMPI_ref ? K_PATH
+                 : K_INSTANCE;
+        const void* p = !v ? nullptr
+                        : type == CMPI_string ? static_cast<const void*>(v->string)
+                        : type == CMPI_dateTime ? static_cast<const void*>(v->dateTime)
+                        : type == CMPI_ref ? static_cast<const void*>(v->ref)
+                        : static_cast<const void*>(v->inst);
+        if (!p)
             return CMPI_RC_OK;
-        Inst_Obj* i = as<Inst_Obj>(v->inst, K_INSTANCE);
-        if (!i)
+        Obj* o = obj_cast<Obj>(p, k, where.c_str());
+        if (!o)
             return CMPI_RC_ERR_INVALID_HANDLE;
-        Instance copy = i->data;
-        copy.path = instance_path(i->data);
-        out = Value::of_instance(copy);
+        val.null = false;
+        out.obj = o;
         return CMPI_RC_OK;
     }
     default:
-        out.type = CMPI_null;
+        val.type = CMPI_null;
         return CMPI_RC_ERR_INVALID_DATA_TYPE;
     }
+}
+
+Value resolve(const Held& h, const std::string& where)
+{
+    return resolve_at(h, where, 0);
+}
+
+CMPIrc from_cmpi(const CMPIValue* v, CMPIType type, Value& out, const std::string& where)
+{
+    Held h;
+    CMPIrc rc = hold(v, type, h, where);
+    out = rc == CMPI_RC_OK ? resolve(h, where) : Value();
+    return rc;
+}
+
+Instance read_instance(const Inst_Obj* o, const std::string& what)
+{
+    return read_instance_at(o, what, 0);
+}
+
+Object_Path read_path(const Path_Obj* o, const std::string& what)
+{
+    return read_path_at(o, what, 0);
+}
+
+std::vector<Property> read_args(const Args_Obj* o, const std::string& what)
+{
+    std::vector<Property> r;
+    std::string here = step(what, "CMPIArgs");
+    for (const Held_Property& a : o->args)
+        r.push_back(Property {a.name, resolve(a.held, step(here, a.name))});
+    return r;
+}
+
+Value read_array(const Array_Obj* o, const std::string& what)
+{
+    return read_array_at(o, what, 0);
 }
 
 CMPIData to_cmpi(const Value& v)
@@ -1139,7 +1504,8 @@ CMPIData to_cmpi(const Value& v)
     if (v.is_array())
     {
         CMPIArray* a = new_array(CMPIType(v.type & ~CMPI_ARRAY), 0);
-        as<Array_Obj>(a, K_ARRAY)->items = v.elements;
+        for (const Value& e : v.elements)
+            as<Array_Obj>(a, K_ARRAY)->items.push_back(copy_of(e));
         d.value.array = a;
         return d;
     }
@@ -1180,27 +1546,29 @@ void widen_key(Value& val)
 
 Object_Path instance_path(const Instance& inst)
 {
-    Object_Path p = inst.path;
-    if (p.class_name.empty())
-        p.class_name = inst.class_name;
-    for (Property& k : p.keys)
-    {
-        const Value* v = inst.get(k.name);
-        if (v && !v->null)
-            k.value = *v;
-    }
+    Object_Path p;
+    p.host = inst.path.host;
+    p.name_space = inst.path.name_space;
+    p.class_name = inst.path.class_name.empty() ? inst.class_name : inst.path.class_name;
+    std::vector<std::string> names;
     const Catalogue* cat = host_catalogue();
     const Class_Info* ci = cat ? cat->find(inst.class_name) : nullptr;
     if (ci)
         for (const Feature_Info& f : ci->features)
-            if (f.key && !p.key(f.name))
-            {
-                const Value* v = inst.get(f.name);
-                if (v && !v->null)
-                    p.keys.push_back(Property {f.name, *v});
-            }
-    for (Property& k : p.keys)
+            if (f.key)
+                names.push_back(f.name);
+    if (names.empty())
+        for (const Property& k : inst.path.keys)
+            names.push_back(k.name);
+    for (const std::string& n : names)
+    {
+        const Value* v = inst.get(n);
+        if (!v || v->null)
+            continue;
+        Property k {n, *v};
         widen_key(k.value);
+        p.keys.push_back(k);
+    }
     return p;
 }
 

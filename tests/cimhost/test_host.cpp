@@ -144,7 +144,8 @@ TEST_F(CimhostHost, GetInstanceAndPropertyFilter)
     EXPECT_EQ(CMPI_RC_ERR_NOT_FOUND, r.rc);
     EXPECT_EQ("no such widget", r.message);
 
-    // The filter keeps the wanted properties and the keys.
+    // The filter keeps the wanted properties and those of the provider's key
+    // list, and the path is made of the key properties left.
     std::vector<std::string> props {"size"};
     r = host->ei(path_of("root/test:Test_Widget"), &props);
     ASSERT_TRUE(r.ok());
@@ -153,7 +154,15 @@ TEST_F(CimhostHost, GetInstanceAndPropertyFilter)
         ASSERT_EQ(2u, i.properties.size());
         EXPECT_NE(nullptr, i.get("Name"));
         EXPECT_NE(nullptr, i.get("Size"));
+        EXPECT_EQ(1u, i.path.keys.size());
     }
+
+    // Without a key list, the keys go, from the instance and from its path.
+    r = host->gi(path_of("root/test:Test_Widget.Name=\"b\""), &props);
+    ASSERT_TRUE(r.ok());
+    ASSERT_EQ(1u, r.instances.size());
+    EXPECT_EQ(nullptr, r.instances[0].get("Name"));
+    EXPECT_EQ("root/test:Test_Widget", r.instances[0].path.to_string());
 
     // Integer keys reach the provider in 64 bits and still match.
     r = host->gi(path_of("root/test:Test_Gadget.Id=2"));

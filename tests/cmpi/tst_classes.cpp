@@ -213,19 +213,33 @@ static const Meta_Property _TST_Alert_Sequence =
     UINT32, 0, (uint32)offsetof(TST_Alert, Sequence), 0,
 };
 
+static const Meta_Property _TST_Alert_Args =
+{
+    { { 0, FLAG_PROPERTY | FLAG_READ, "Args", 0, 0 } },
+    STRING, -1, (uint32)offsetof(TST_Alert, Args), 0,
+};
+
+static const Meta_Property _TST_Alert_When =
+{
+    { { 0, FLAG_PROPERTY | FLAG_READ, "When", 0, 0 } },
+    DATETIME, 0, (uint32)offsetof(TST_Alert, When), 0,
+};
+
 static Meta_Feature* _TST_Alert_MFA[] =
 {
     (Meta_Feature*)&_TST_Alert_Message,
     (Meta_Feature*)&_TST_Alert_Sequence,
+    (Meta_Feature*)&_TST_Alert_Args,
+    (Meta_Feature*)&_TST_Alert_When,
 };
 
-static const uint8 _TST_Alert_locals[] = { 1, 1 };
+static const uint8 _TST_Alert_locals[] = { 1, 1, 1, 1 };
 
 const Meta_Class TST_Alert::static_meta_class =
 {
     { 0, FLAG_INDICATION, "TST_Alert", 0, 0 },
     _TST_Alert_MFA,
-    2,
+    4,
     sizeof(TST_Alert),
     _TST_Alert_locals,
     0,

@@ -76,6 +76,8 @@ struct TST_Alert : Instance
 {
     Property<String> Message;
     Property<uint32> Sequence;
+    Property<Array<String> > Args;
+    Property<Datetime> When;
 
     static const Meta_Class static_meta_class;
 };

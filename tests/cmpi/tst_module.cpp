@@ -161,12 +161,17 @@ public:
             snprintf(name, sizeof(name), "part%u", i);
             TST_Part* p = tst_make_part(name, uint16(i));
 
-            // One plain and one embedded reference to the previous part.
+            // References to the previous part, plain and embedded, alone
+            // and in arrays.
             if (i > 0)
             {
                 snprintf(name, sizeof(name), "part%u", i - 1);
                 p->Peer = tst_make_key(name, uint16(i - 1));
                 p->Embedded = tst_make_part(name, uint16(i - 1));
+                TST_Part* peers[] = { tst_make_key(name, uint16(i - 1)) };
+                p->Peers.set(Array<TST_Part*>(peers, 1));
+                TST_Part* embeddeds[] = { tst_make_part(name, uint16(i - 1)) };
+                p->Embeddeds.set(Array<TST_Part*>(embeddeds, 1));
             }
 
             _state.sent++;
@@ -342,6 +347,9 @@ private:
                 TST_Alert* alert = create<TST_Alert>(false);
                 alert->Message.set("alert");
                 alert->Sequence.set(++_state.alerts_sent);
+                String args[] = { String("port"), String("down") };
+                alert->Args.set(Array<String>(args, 2));
+                alert->When.set(Datetime("20240102030405.000006+060"));
                 self->_handler->handle(alert);
             }
             else

@@ -401,3 +401,32 @@ TEST_F(Providers, AnFCOnlyHostHasNoEthernetClasses)
     EXPECT_TRUE(served("VESPERA_LANEndpoint").empty());
     EXPECT_EQ(1u, countLines(lan.text(), {"WARN: ", "No Ethernet Port Found"}));
 }
+
+// A client that asks for one property still gets instances it can name: a
+// server that builds the paths from the key properties left on the instance
+// (SFCB) must find them all there.
+TEST_F(Providers, APropertyListKeepsTheKeysOfEveryPath)
+{
+    const std::vector<std::string> speed = { "Speed" };
+
+    for (const char* cls : { "VESPERA_FCPort", "VESPERA_ComputerSystem", "VESPERA_LogicalDisk" })
+    {
+        ch::Result names = ein(cls);
+        ASSERT_EQ(CMPI_RC_OK, names.rc) << cls;
+        ch::Result some = host->ei(classPath(cls), &speed);
+        ASSERT_EQ(CMPI_RC_OK, some.rc) << cls;
+        ASSERT_EQ(names.paths.size(), some.instances.size()) << cls;
+
+        for (size_t i = 0; i < some.instances.size(); i++)
+        {
+            EXPECT_TRUE(ch::path_equal(names.paths[i], some.instances[i].path))
+                << some.instances[i].path.to_string();
+
+            ch::Result one = host->gi(names.paths[i], &speed);
+            ASSERT_EQ(CMPI_RC_OK, one.rc) << names.paths[i].to_string();
+            ASSERT_EQ(1u, one.instances.size());
+            EXPECT_TRUE(ch::path_equal(names.paths[i], one.instances[0].path))
+                << one.instances[0].path.to_string();
+        }
+    }
+}

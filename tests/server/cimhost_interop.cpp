@@ -38,6 +38,8 @@ protected:
     {
         ASSERT_TRUE(host->ok()) << host->error();
         host->set_interop(true);
+        host->set_interop_namespace("root/PG_InterOp");
+        host->set_pegasus_enumerations(false);
     }
 
     static ch::Result ei(const std::string& ns, const std::string& cls)
@@ -68,6 +70,12 @@ protected:
     {
         const ch::Value* v = i.get(property);
         return !v || v->null;
+    }
+
+    static std::string key(const ch::Instance& i, const char* name)
+    {
+        const ch::Value* v = i.path.key(name);
+        return v ? v->text() : "(no key " + std::string(name) + ")";
     }
 
     static const ch::Value& get(const ch::Instance& i, const char* property)
@@ -256,18 +264,45 @@ TEST_F(Interop, ServerThatCantBeAskedIsCalledCIMServer)
     EXPECT_EQ(ns.instances[0].get_text("ObjectManagerName"), "CIM Server");
 }
 
-TEST_F(Interop, ServerWithoutObjectManagerLeavesItsValuesNull)
+TEST_F(Interop, ServerWithoutObjectManagerNamesTheKeysOnly)
 {
     host->set_interop(true, true);
     ch::Result om = served("VESPERA_ObjectManager");
     ASSERT_EQ(om.instances.size(), 1u);
-    for (const char* p : { "Name", "Caption", "Description" })
+    for (const char* p : { "Caption", "Description" })
         EXPECT_TRUE(isNull(om.instances[0], p)) << p;
+    EXPECT_EQ(om.instances[0].get_text("Name"), "CIM Server");
+    EXPECT_EQ(key(om.instances[0], "Name"), "CIM Server");
     EXPECT_EQ(om.instances[0].get_text("ElementName"), "CIM Server");
 
     ch::Result ns = served("VESPERA_Namespace");
     ASSERT_EQ(ns.instances.size(), 1u);
-    EXPECT_TRUE(isNull(ns.instances[0], "ObjectManagerName"));
+    EXPECT_EQ(key(ns.instances[0], "ObjectManagerName"), "CIM Server");
+}
+
+// OpenPegasus marks the instances it enumerates for a provider as null;
+// SFCB keeps its object manager in root/interop. Either way the server's own
+// name is found, and ends up in the keys.
+TEST_F(Interop, ObjectManagerIsFoundOnBothServers)
+{
+    ch::Result server = ei("root/PG_InterOp", "CIM_ObjectManager");
+    ASSERT_FALSE(server.instances.empty());
+    std::string name = server.instances[0].get_text("Name");
+
+    for (int sfcb = 0; sfcb < 2; sfcb++)
+    {
+        host->set_pegasus_enumerations(!sfcb);
+        host->set_interop_namespace(sfcb ? "root/interop" : "root/PG_InterOp");
+
+        ch::Result om = served("VESPERA_ObjectManager");
+        ASSERT_EQ(om.instances.size(), 1u);
+        EXPECT_EQ(key(om.instances[0], "Name"), name) << sfcb;
+        EXPECT_EQ(om.instances[0].get_text("Caption"), "cimhost") << sfcb;
+
+        ch::Result ns = served("VESPERA_Namespace");
+        ASSERT_EQ(ns.instances.size(), 1u);
+        EXPECT_EQ(key(ns.instances[0], "ObjectManagerName"), name) << sfcb;
+    }
 }
 
 TEST_F(Interop, MethodsAreRefused)

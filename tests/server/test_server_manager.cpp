@@ -78,6 +78,8 @@ class Interop_Context : public Thread_Context
 {
 public:
     Interop_Mode mode = INTEROP_FAILS;
+    // When set, every other namespace fails.
+    std::string only_in;
     std::vector<Instance*> answer;
     std::vector<std::string> asked_namespaces;
     std::vector<std::string> asked_classes;
@@ -97,7 +99,7 @@ public:
     {
         asked_namespaces.push_back(name_space ? name_space : "");
         asked_classes.push_back(model ? model->meta_class->name : "");
-        if (mode == INTEROP_FAILS)
+        if (mode == INTEROP_FAILS || (!only_in.empty() && only_in != name_space))
             return 0;
         Fake_Enumerator* e = new Fake_Enumerator;
         if (mode == INTEROP_ANSWERS)
@@ -297,9 +299,11 @@ TEST(ServerManagerInterop, ServerThatCantBeAskedIsCalledCIMServer)
     Interop_Context failing;
     failing.mode = INTEROP_FAILS;
     EXPECT_EQ(askBoth(&failing), fallback);
-    // Each class asks once, in the interop namespace, for the object manager.
-    EXPECT_EQ(failing.asked_namespaces, (std::vector<std::string>{ "root/PG_InterOp", "root/PG_InterOp" }));
-    EXPECT_EQ(failing.asked_classes, (std::vector<std::string>{ "CIM_ObjectManager", "CIM_ObjectManager" }));
+    // Each class asks for the object manager in OpenPegasus's interop
+    // namespace, then in SFCB's.
+    EXPECT_EQ(failing.asked_namespaces, (std::vector<std::string>{
+        "root/PG_InterOp", "root/interop", "root/PG_InterOp", "root/interop" }));
+    EXPECT_EQ(failing.asked_classes, std::vector<std::string>(4, "CIM_ObjectManager"));
 
     // An answer that isn't an object manager can't be read either.
     Interop_Context other;
@@ -322,13 +326,24 @@ TEST(ServerManagerInterop, ServerAnswerIsTakenFromItsFirstInstance)
     for (Instance* i : c.answer)
         EXPECT_EQ(i->refs, 1u);
 
+    // SFCB has no root/PG_InterOp; its own namespace answers.
+    Interop_Context sfcb;
+    sfcb.mode = INTEROP_ANSWERS;
+    sfcb.only_in = "root/interop";
+    sfcb.answer.push_back(serverObjectManager("sfcb:host1", "sfcb", "Small Footprint CIM Broker"));
+    EXPECT_EQ(askBoth(&sfcb), "sfcb:host1|sfcb|Small Footprint CIM Broker|sfcb:host1");
+
+    // Keys are never left null: an answer without a name, or no answer at
+    // all, names the object manager generically; the rest stays unknown.
     Interop_Context nulls;
     nulls.mode = INTEROP_ANSWERS;
     nulls.answer.push_back(serverObjectManager(0, "Pegasus", 0));
-    EXPECT_EQ(askBoth(&nulls), "<null>|Pegasus|<null>|<null>");
+    EXPECT_EQ(askBoth(&nulls), "CIM Server|Pegasus|<null>|CIM Server");
 
     Interop_Context empty;
     empty.mode = INTEROP_EMPTY;
-    EXPECT_EQ(askBoth(&empty), "<null>|<null>|<null>|<null>");
+    EXPECT_EQ(askBoth(&empty), "CIM Server|<null>|<null>|CIM Server");
     EXPECT_EQ(empty.open_enumerators, 0);
+    // An empty answer is an answer: SFCB's namespace isn't asked.
+    EXPECT_EQ(empty.asked_namespaces, std::vector<std::string>(2, "root/PG_InterOp"));
 }

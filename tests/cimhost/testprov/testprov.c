@@ -158,11 +158,12 @@ static CMPIStatus Widget_EnumInstances(CMPIInstanceMI* mi, const CMPIContext* ct
     size_t i;
     (void)mi;
     (void)ctx;
+    static const char* keys[] = {"Name", NULL};
     for (i = 0; i < N(widgets); i++)
     {
         CMPIInstance* ci = widget_instance(ns_of(op), &widgets[i]);
         if (properties)
-            CMSetPropertyFilter(ci, properties, NULL);
+            CMSetPropertyFilter(ci, properties, keys);
         CMReturnInstance(rslt, ci);
         CMRelease(ci);
     }
@@ -181,6 +182,8 @@ static CMPIStatus Widget_GetInstance(CMPIInstanceMI* mi, const CMPIContext* ctx,
     if (!w)
         CMReturnWithChars(broker, CMPI_RC_ERR_NOT_FOUND, "no such widget");
     ci = widget_instance(ns_of(op), w);
+    /* No key list: a server that builds the path from what is left loses
+     * the keys the list doesn't name. */
     if (properties)
         CMSetPropertyFilter(ci, properties, NULL);
     CMReturnInstance(rslt, ci);
