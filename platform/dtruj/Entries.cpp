@@ -1,6 +1,7 @@
 // The 117 exported entries of the simulated adapter library, and the few
 // extra exports that tests and users drive it with.
 #include "Sim.h"
+#include "Console.h"
 
 #include <chrono>
 #include <cmath>
@@ -60,14 +61,14 @@ bool applyFault(const char* entry, Json::Value& reply)
 Json::Value call(const char* entry, const Json::Value& req, Handler h)
 {
     Json::Value reply;
-    if (applyFault(entry, reply))
+    if (applyFault(entry, reply) || echoReply(entry, req, reply))
         return reply;
     State& s = state();
     std::lock_guard<std::mutex> g(s.mtx);
     if (!s.initialised)
         return errorReply(1, std::string(entry) + ": the adapter library is not initialised");
     SIMLOG(SL_DEBUG, "enter %s", entry);
-    if (!req.isNull() && !req.isObject())
+    if (!req.isNull() && !req.isObject() && !takesAnyRequest(entry))
         return errorReply(3, std::string(entry) + ": the request is not a JSON object");
     // A member of an unexpected type, in the request or in a hand-written
     // host description, makes JsonCpp throw; the caller gets an error reply
@@ -597,8 +598,10 @@ JSON_ENTRY(getGlobalInfo)
         e["portWwn"] = pw;
         e["portMac"] = pm;
         e["fcoeMac"] = fm;
+        overlayGlobalInfo(e, a);
         r["adapter"].append(e);
     }
+    overlayGlobalInfo(r, s.host);
     return r;
 }
 
@@ -1819,7 +1822,7 @@ Json::Value runDirect(const char* entry, const Json::Value& req,
                       Json::Value (*prepare)(State&, const Json::Value&, int&))
 {
     Json::Value reply;
-    if (applyFault(entry, reply))
+    if (applyFault(entry, reply) || echoReply(entry, req, reply))
         return reply;
     State& s = state();
     int delay = 0;
@@ -1999,6 +2002,7 @@ DTRUJ_API int dtruj_sim_reset()
         return -1;
     }
     s.lastRequestId = 0;
+    resetEcho();
     return 0;
 }
 
