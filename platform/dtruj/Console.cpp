@@ -143,6 +143,21 @@ void overlayGlobalInfo(Json::Value& target, const Json::Value& described)
         target[m] = over[m];
 }
 
+void appendPortLog(Json::Value& port, const std::string& message)
+{
+    Json::Value& logs = port["logs"];
+    if (!logs.isArray())
+        logs = Json::Value(Json::arrayValue);
+    Json::Value record(Json::objectValue);
+    record["time"] = Json::UInt64(now());
+    record["message"] = message;
+    logs.append(record);
+    while (logs.size() > 100) {
+        Json::Value removed;
+        logs.removeIndex(0, &removed);
+    }
+}
+
 } // namespace Sim
 } // namespace OLMA
 

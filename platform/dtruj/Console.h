@@ -7,6 +7,7 @@
 #ifndef DTRUJ_CONSOLE_H
 #define DTRUJ_CONSOLE_H
 
+#include <string>
 #include <json/json.h>
 
 namespace OLMA {
@@ -28,6 +29,11 @@ bool takesAnyRequest(const char* entry);
 // global information says what the description wants, also what disagrees
 // with its adapters.
 void overlayGlobalInfo(Json::Value& target, const Json::Value& described);
+
+// Adds a record {"time", "message"} to a port's "logs", which
+// getAdvPortDataByPort shows and clearLogsForPort empties; the oldest go
+// beyond 100 records.
+void appendPortLog(Json::Value& port, const std::string& message);
 
 } // namespace Sim
 } // namespace OLMA

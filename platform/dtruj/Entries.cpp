@@ -874,6 +874,7 @@ JSON_ENTRY(setPortByWwn)
         return errorReply(3, err);
     if (contains(changed, "portStatus")) {
         bool on = (*port)["portStatus"].asBool();
+        appendPortLog(*port, on ? "Port enabled" : "Port disabled");
         if (p.fc)
             portEvent(s, 2, on ? 7 : 8, (*port)["wwn"].asString(), on ? "TRU_PORT_ENABLE" : "TRU_PORT_DISABLE",
                       on ? 1 : 2, on ? "Base port enabled" : "Base port disabled");
@@ -956,6 +957,7 @@ JSON_ENTRY(getAdvPortDataByPort)
     r["alias"] = (*p.fc)["alias"];
     r["trunkingEnabled"] = (*p.fc)["trunking"]["enabled"];
     r["dportEnabled"] = (*p.fc)["dport"]["enabled"];
+    r["logs"] = (*p.fc)["logs"];
     return r;
 }
 
@@ -1722,6 +1724,12 @@ JSON_ENTRY(postDiagnostics)
         known = known || fn == *f;
     if (!known)
         return errorReply(11, "Unknown test function: " + fn);
+    // A test of an adapter or port that isn't there is refused at once.
+    std::string hba = str(req, "hbaWwn"), port = str(req, "portWwn");
+    if (!hba.empty() && !findAdapter(s, hba))
+        return notFound("adapter", hba);
+    if (!port.empty() && !findPort(s, port).fc && !findPort(s, port).eth)
+        return notFound("port", port);
     DiagRun& run = s.runs[id];
     if (run.started)
         return errorReply(12, "Tests of request " + id + " have already started");
