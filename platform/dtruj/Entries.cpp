@@ -1,6 +1,7 @@
 // The 117 exported entries of the simulated adapter library, and the few
 // extra exports that tests and users drive it with.
 #include "Sim.h"
+#include "Console.h"
 
 #include <chrono>
 #include <cmath>
@@ -60,14 +61,14 @@ bool applyFault(const char* entry, Json::Value& reply)
 Json::Value call(const char* entry, const Json::Value& req, Handler h)
 {
     Json::Value reply;
-    if (applyFault(entry, reply))
+    if (applyFault(entry, reply) || echoReply(entry, req, reply))
         return reply;
     State& s = state();
     std::lock_guard<std::mutex> g(s.mtx);
     if (!s.initialised)
         return errorReply(1, std::string(entry) + ": the adapter library is not initialised");
     SIMLOG(SL_DEBUG, "enter %s", entry);
-    if (!req.isNull() && !req.isObject())
+    if (!req.isNull() && !req.isObject() && !takesAnyRequest(entry))
         return errorReply(3, std::string(entry) + ": the request is not a JSON object");
     // A member of an unexpected type, in the request or in a hand-written
     // host description, makes JsonCpp throw; the caller gets an error reply
@@ -603,8 +604,10 @@ JSON_ENTRY(getGlobalInfo)
         e["portWwn"] = pw;
         e["portMac"] = pm;
         e["fcoeMac"] = fm;
+        overlayGlobalInfo(e, a);
         r["adapter"].append(e);
     }
+    overlayGlobalInfo(r, s.host);
     return r;
 }
 
@@ -873,6 +876,7 @@ JSON_ENTRY(setPortByWwn)
         return errorReply(3, err);
     if (contains(changed, "portStatus")) {
         bool on = (*port)["portStatus"].asBool();
+        appendPortLog(*port, on ? "Port enabled" : "Port disabled");
         if (p.fc)
             portEvent(s, 2, on ? 7 : 8, (*port)["wwn"].asString(), on ? "TRU_PORT_ENABLE" : "TRU_PORT_DISABLE",
                       on ? 1 : 2, on ? "Base port enabled" : "Base port disabled");
@@ -958,6 +962,7 @@ JSON_ENTRY(getAdvPortDataByPort)
     copyIfAny(r, "alias", port);
     r["trunkingEnabled"] = port["trunking"]["enabled"];
     r["dportEnabled"] = port["dport"]["enabled"];
+    copyIfAny(r, "logs", port);
     return r;
 }
 
@@ -1737,6 +1742,12 @@ JSON_ENTRY(postDiagnostics)
         known = known || fn == *f;
     if (!known)
         return errorReply(11, "Unknown test function: " + fn);
+    // A test of an adapter or port that isn't there is refused at once.
+    std::string hba = str(req, "hbaWwn"), port = str(req, "portWwn");
+    if (!hba.empty() && !findAdapter(s, hba))
+        return notFound("adapter", hba);
+    if (!port.empty() && !findPort(s, port).fc && !findPort(s, port).eth)
+        return notFound("port", port);
     DiagRun& run = s.runs[id];
     if (run.started)
         return errorReply(12, "Tests of request " + id + " have already started");
@@ -1837,7 +1848,7 @@ Json::Value runDirect(const char* entry, const Json::Value& req,
                       Json::Value (*prepare)(State&, const Json::Value&, int&))
 {
     Json::Value reply;
-    if (applyFault(entry, reply))
+    if (applyFault(entry, reply) || echoReply(entry, req, reply))
         return reply;
     State& s = state();
     int delay = 0;
@@ -2018,6 +2029,7 @@ DTRUJ_API int dtruj_sim_reset()
         return -1;
     }
     s.lastRequestId = 0;
+    resetEcho();
     return 0;
 }
 

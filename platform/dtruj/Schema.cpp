@@ -219,7 +219,8 @@ const Shape adapterDiag = {OBJECT, adapterDiagMembers, nullptr};
 const Member adapterMembers[] = {
     {"hbaData", &hbaData}, {"driver", &driver}, {"firmware", &firmware}, {"flash", &flash},
     {"advData", &adapterAdvData}, {"diag", &adapterDiag}, {"fcPorts", &fcPorts},
-    {"ethPorts", &ethPorts}, {"unchecked", &freeObject}, {nullptr, nullptr}};
+    {"ethPorts", &ethPorts}, {"globalInfo", &freeObject}, {"unchecked", &freeObject},
+    {nullptr, nullptr}};
 const Shape adapter = {OBJECT, adapterMembers, nullptr};
 const Shape adapters = {ARRAY, nullptr, &adapter};
 
@@ -246,7 +247,7 @@ const Shape diagnostics = {OBJECT, diagnosticsMembers, nullptr};
 
 const Member rootMembers[] = {
     {"host", &hostPart}, {"faults", &faults}, {"diagnostics", &diagnostics},
-    {"adapters", &adapters}, {nullptr, nullptr}};
+    {"adapters", &adapters}, {"globalInfo", &freeObject}, {nullptr, nullptr}};
 const Shape root = {OBJECT, rootMembers, nullptr};
 
 bool isNumber(const Json::Value& v)
