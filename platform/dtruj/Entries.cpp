@@ -59,6 +59,7 @@ bool applyFault(const char* entry, Json::Value& reply)
 
 Json::Value call(const char* entry, const Json::Value& req, Handler h)
 {
+    recordCall(entry, req);
     Json::Value reply;
     if (applyFault(entry, reply))
         return reply;
@@ -632,9 +633,8 @@ JSON_ENTRY(getHbaByMac) { return hbaBy(s, firstOf(req, {"mac", "wwn", "indexStr"
 JSON_ENTRY(getAdapterId)
 {
     std::string addr = firstOf(req, {"indexStr", "wwn", "mac"});
-    int id = 0;
-    if (!findAdapter(s, addr, &id))
-        return notFound("adapter", addr);
+    int id = 0;     // 0: no adapter has this address
+    findAdapter(s, addr, &id);
     Json::Value r(Json::objectValue);
     r["adapterId"] = id;
     return r;
@@ -1836,6 +1836,7 @@ namespace {
 Json::Value runDirect(const char* entry, const Json::Value& req,
                       Json::Value (*prepare)(State&, const Json::Value&, int&))
 {
+    recordCall(entry, req);
     Json::Value reply;
     if (applyFault(entry, reply))
         return reply;
@@ -2005,7 +2006,8 @@ DTRUJ_API int dtruj_sim_set_fault(const char* entry, const char* kind)
     return 0;
 }
 
-// Reloads the host description and forgets faults, runs and resets. The
+// Reloads the host description and forgets faults, runs, resets and the
+// calls it got. The
 // library stays initialised if it was.
 DTRUJ_API int dtruj_sim_reset()
 {
@@ -2018,6 +2020,7 @@ DTRUJ_API int dtruj_sim_reset()
         return -1;
     }
     s.lastRequestId = 0;
+    clearCalls();
     return 0;
 }
 
