@@ -53,7 +53,7 @@ DiagnosticRunResult::~DiagnosticRunResult()
 
 DiagnosticHelper::DiagnosticHelper() :
     nextRecordId(0), nextJobId(0), serviceRecordLock(true), completionRecordLock(true),
-    jobLock(true), runLock(true), _stopping(false), _testProviders(0)
+    jobLock(true), runLock(true), _stopping(false), _testProviders(0), _threadsRunning(0)
 {
     for (int i = 0; i < SLOT_COUNT; i++)
         testThreadLive[i] = false;
@@ -61,8 +61,9 @@ DiagnosticHelper::DiagnosticHelper() :
 
 DiagnosticHelper::~DiagnosticHelper()
 {
-    // The module is going: a test thread must not outlive its code.
-    stopTests();
+    // The module is going: a test thread must not outlive its code, however
+    // long its library call takes.
+    stopTests(false);
 }
 
 DiagnosticHelper* DiagnosticHelper::getDiagnosticHelperObject()

@@ -123,7 +123,9 @@ private:
 // one; the lists have a lock each, and no code holds two of them at once.
 // The test thread is joined before the next one starts, and when the last
 // test provider unloads (or the module goes), so that no thread is left
-// running in code that may be unmapped.
+// running in code that may be unmapped: an unload stops the test at its
+// next step, and one that stays in the library past a bound keeps the
+// module mapped until it is done.
 class DiagnosticHelper
 {
 public:
@@ -188,10 +190,17 @@ public:
     void testProviderLoaded();
     void testProviderUnloaded();
 
-    // Stops a running test at its next step (the library call in flight
-    // ends by itself), lets it restore its port or adapter and complete
-    // its job, and joins it. Nothing is started meanwhile.
-    void stopTests();
+    // Stops a running test at its next step, lets it restore its port or
+    // adapter and complete its job, and joins it; nothing is started
+    // meanwhile. A library call in flight can't be cut short: bounded, the
+    // wait ends after STOP_WAIT_MS, and a test still in the library then
+    // goes on by itself while the module is kept mapped for it.
+    void stopTests(bool bounded = true);
+
+    enum { STOP_WAIT_MS = 5000 };
+
+    // The last thing a test thread does in the run.
+    void testThreadEnded() { --_threadsRunning; }
 
     // For the threads: whether to cut the run short, and a pause that ends
     // early when so.
@@ -218,6 +227,10 @@ private:
     // Joins every test thread that was started and not yet joined.
     void _joinFinished();
 
+    // Lets the test threads go without a join, and keeps the module's code
+    // mapped for them whatever the server unloads.
+    void _letGo();
+
     // Builds record instances from copies, fetching each element once.
     Array<Instance*> _recordInstances(bool serviceRecords, bool associations);
 
@@ -241,6 +254,7 @@ private:
 
     std::atomic<bool> _stopping;
     std::atomic<int> _testProviders;
+    std::atomic<int> _threadsRunning;
 
     DiagnosticHelper(const DiagnosticHelper&);
     DiagnosticHelper& operator=(const DiagnosticHelper&);

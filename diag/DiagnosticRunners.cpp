@@ -3,6 +3,8 @@
 // the test through the adapter library, put it back and leave records.
 #include "DiagnosticHelper.h"
 
+#include <dlfcn.h>
+#include <pthread.h>
 #include <stdarg.h>
 #include <stdio.h>
 
@@ -524,11 +526,13 @@ void Test_Run::memory()
 void* runThread(void* arg, Test_Run::Body body)
 {
     DiagnosticTestInput* input = (DiagnosticTestInput*)arg;
+    DiagnosticHelper* helper = input->helper;
     {
         Test_Run run(input);
         run.run(body);
     }
     delete input;
+    helper->testThreadEnded();
     return 0;
 }
 
@@ -666,10 +670,44 @@ void DiagnosticHelper::_joinFinished()
     }
 }
 
-void DiagnosticHelper::stopTests()
+void DiagnosticHelper::_letGo()
+{
+    for (int i = 0; i < SLOT_COUNT; i++)
+    {
+        if (testThreadLive[i])
+            pthread_detach(testThreads[i]._thread);
+        testThreadLive[i] = false;
+    }
+
+    // Opening the module again with RTLD_NODELETE keeps it mapped after the
+    // server's last dlclose.
+    Dl_info info;
+
+    if (dladdr((void*)&gDiagnosticHelperObj, &info) && info.dli_fname)
+    {
+        void* self = dlopen(info.dli_fname, RTLD_NOW | RTLD_NOLOAD | RTLD_NODELETE);
+        if (self)
+            dlclose(self);
+    }
+}
+
+void DiagnosticHelper::stopTests(bool bounded)
 {
     Auto_Mutex hold(runLock);
     _stopping = true;
+
+    // The pauses of a run end at once; a library call ends when it ends.
+    for (uint64 waited = 0; bounded && _threadsRunning.load() > 0 &&
+         waited < STOP_WAIT_MS * Time::MSEC; waited += 10 * Time::MSEC)
+        Time::sleep(10 * Time::MSEC);
+
+    if (_threadsRunning.load() > 0 && bounded)
+    {
+        TLOG(LL_WARN, "A diagnostic test is still in the adapter library; it ends by itself");
+        _letGo();
+        return;
+    }
+
     _joinFinished();
     _stopping = false;
 }
@@ -702,10 +740,14 @@ void DiagnosticHelper::_startRun(DiagnosticRunResult* result, DiagnosticTestInpu
     _joinFinished();
     addDiagnosticJob(job);
 
+    // A stop that let a thread go ends with that thread's job.
+    _stopping = false;
+    ++_threadsRunning;
     int rc = Thread::create_joinable(testThreads[slot], proc, input);
 
     if (rc != 0)
     {
+        --_threadsRunning;
         TLOG(LL_ERR, "Unable to start the test thread of %s: %d", job.name.c_str(), rc);
         updateJobState(job.name);
         delete input;

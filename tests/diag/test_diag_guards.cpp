@@ -215,6 +215,33 @@ TEST_F(DiagGuards, AnUnloadStopsARunningTestAndPutsThePortBack)
     EXPECT_EQ(Texts{"PCI Loopback test run is successful"}, again.completionTexts());
 }
 
+TEST_F(DiagGuards, AnUnloadWaitsForALibraryCallOnlySoLong)
+{
+    Json::Value h = fastHost();
+    h["diagnostics"]["ethLoopback"]["durationMs"] = 7000;
+    useHost(h);
+
+    TestRun run = start("VESPERA_EthLoopbackDiagnosticTest", "SerdesEthLoopbackTest",
+        "VESPERA_EthernetPort", ETH_PORT);
+    ASSERT_EQ(4096u, run.status);
+    for (int i = 0; i < 100 && calledOf({"diagEthLoopbackTest"}).empty(); i++)
+        std::this_thread::sleep_for(std::chrono::milliseconds(10));
+
+    // The test is in the library: the unload gives up waiting for it, and
+    // the test ends by itself with its own outcome.
+    auto t0 = std::chrono::steady_clock::now();
+    EXPECT_EQ(0, host->cleanup(false));
+    auto ms = std::chrono::duration_cast<std::chrono::milliseconds>(
+        std::chrono::steady_clock::now() - t0).count();
+    EXPECT_GE(ms, 4500);
+    EXPECT_LT(ms, 6500);
+    EXPECT_EQ(4u, jobState(run.job));
+
+    await(run);
+    EXPECT_EQ(Texts{"Eth loopback test run is successful"}, run.completionTexts());
+    EXPECT_TRUE(portEnabled(ETH_PORT));
+}
+
 TEST_F(DiagGuards, WhatTheHostOffers)
 {
     // Every test before any run; records and jobs are empty.
