@@ -2007,8 +2007,7 @@ DTRUJ_API int dtruj_sim_set_fault(const char* entry, const char* kind)
 }
 
 // Reloads the host description and forgets faults, runs, resets and the
-// calls it got. The
-// library stays initialised if it was.
+// calls it got. The library stays initialised if it was.
 DTRUJ_API int dtruj_sim_reset()
 {
     State& s = state();
