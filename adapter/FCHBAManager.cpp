@@ -3,6 +3,7 @@
 #include "AccessPointHelper.h"
 #include "AdapterHelper.h"
 #include "CommonHelper.h"
+#include "DiagnosticHelper.h"
 #include "EthernetPortHelper.h"
 #include "PhysicalAssetHelper.h"
 #include "PortHelper.h"
@@ -24,7 +25,7 @@ FCHBAManager::FCHBAManager() :
     accessPointHelper(AccessPointHelper::getAccessPointHelperInstance()),
     softwareUpdateHelper(0),
     ethernetPortHelper(EthernetPortHelper::getEthernetPortHelperObject()),
-    diagnosticHelper(0),
+    diagnosticHelper(DiagnosticHelper::getDiagnosticHelperObject()),
     physicalAssetHelper(PhysicalAssetHelper::getPhysicalAssetHelperObject())
 {
 }
@@ -42,8 +43,8 @@ FCHBAManager* FCHBAManager::getFCHBAManager()
 //
 // The one place where a class id meets the helper that builds its
 // instances. The driver status has been checked by the caller. The software
-// update and diagnostic helpers aren't part of the module yet: their classes
-// answer with no instances until they are wired in here.
+// update helper isn't part of the module yet: its classes answer with no
+// instances until it is wired in here.
 //------------------------------------------------------------------------------
 
 Array<Instance*> FCHBAManager::_serve(classId_t id)
@@ -89,8 +90,7 @@ Array<Instance*> FCHBAManager::_serve(classId_t id)
         case ID_VESPERA_AffectedJobElement:
         case ID_VESPERA_ServiceRecordAppliesToElement:
         case ID_VESPERA_CompletionRecordAppliesToElement:
-            // DiagnosticHelper
-            return Array<Instance*>();
+            return diagnosticHelper->getInstancesByClass(id);
 
         case ID_VESPERA_PhysicalConnector:
             return physicalAssetHelper->getInstancesByClass(id);
@@ -98,12 +98,6 @@ Array<Instance*> FCHBAManager::_serve(classId_t id)
         default:
             return Array<Instance*>();
     }
-}
-
-static Array<Instance*> _diagnosticServices()
-{
-    // DiagnosticHelper::getDiagnosticServices()
-    return Array<Instance*>();
 }
 
 //------------------------------------------------------------------------------
@@ -176,7 +170,7 @@ Array<Instance*> FCHBAManager::getEthernetPortInstancesByAdapter(
 
 Array<Instance*> FCHBAManager::getAllDiagnosticTestInstances()
 {
-    return _diagnosticServices();
+    return diagnosticHelper->getDiagnosticServices();
 }
 
 Array<Instance*> FCHBAManager::getDiagnosticServicesForAdapter()

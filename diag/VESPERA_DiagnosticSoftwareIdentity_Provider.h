@@ -1,13 +1,19 @@
 #ifndef _VESPERA_DiagnosticSoftwareIdentity_Provider_h
 #define _VESPERA_DiagnosticSoftwareIdentity_Provider_h
 
+#include "Provider.h"
+#include "VESPERA_DiagnosticSoftwareIdentity.h"
+
 namespace OLMA
 {
 
-// Serves VESPERA_DiagnosticSoftwareIdentity. Until its data source is wired it has no instances and
-// supports no other operation.
+// Serves VESPERA_DiagnosticSoftwareIdentity: the diagnostic software. Enumeration only.
 class VESPERA_DiagnosticSoftwareIdentity_Provider
 {
+public:
+
+    Enum_Instances_Status enum_instances(
+        const VESPERA_DiagnosticSoftwareIdentity* model, Enum_Instances_Handler<VESPERA_DiagnosticSoftwareIdentity>* handler);
 };
 
 } // namespace OLMA

@@ -1,6 +1,7 @@
 // cimhost: try a CMPI provider module from the command line, without a CIM
 // server. Verbs follow the wbemcli client; see usage() for all of them.
 
+#include <algorithm>
 #include <chrono>
 #include <cstdio>
 #include <cstdlib>
@@ -67,6 +68,17 @@ const char usage_text[] =
     "      cimhost cm PATH RequestStateChange 'Job=ref:root/vespera:VESPERA_ConcreteJob.InstanceID=\"j1\"'\n"
     "  listen NS:CLASS       subscribe to indications and print each as it arrives\n"
     "      cimhost listen root/vespera:VESPERA_AlertIndication --seconds 30\n"
+    "  session               read verbs from standard input, one a line, and answer\n"
+    "                        each as the single command would, all in one process: a\n"
+    "                        test started by one line can be polled by the next.\n"
+    "                        Words are split as a shell splits them ('...', \"...\",\n"
+    "                        backslash); a line may carry its own options but --module,\n"
+    "                        --reg and --no-interop, which hold for the whole session.\n"
+    "                        Blank lines and lines starting with # are skipped, and\n"
+    "                        \"sleep SECONDS\" waits (fractions allowed). The exit status\n"
+    "                        is the worst of the lines'.\n"
+    "      printf '%s\\n' 'cm PATH RunDiagnostic ManagedElement=...' 'sleep 5' \\\n"
+    "          'ei root/vespera:VESPERA_ConcreteJob' | cimhost session\n"
     "\n"
     "Options:\n"
     "  --module PATH         provider module to load (default: the built\n"
@@ -97,6 +109,9 @@ const char usage_text[] =
     "\n"
     "Exit status: 0 success; 1 the operation failed (the CMPI return code's name is\n"
     "printed) or the module couldn't be loaded; 2 bad input.\n";
+
+// The options that choose and load the module; a session sets them once.
+const char* const session_wide[] = {"--module", "--reg", "--no-interop"};
 
 struct Bad_Input
 {
@@ -203,13 +218,14 @@ std::vector<std::string> split_list(const std::string& s)
     return r;
 }
 
-Args read_args(int argc, char** argv)
+Args read_args(const std::vector<std::string>& argv)
 {
     Args a;
-    static const char* const valued[] = {"--module",       "--reg",         "--props",
-                                         "--assoc-class",  "--result-class", "--role",
-                                         "--result-role",  "--seconds",     "--interop-namespace"};
-    for (int i = 1; i < argc; i++)
+    static const char* const valued[] = {"--module", "--reg", "--props", "--assoc-class",
+                                         "--result-class", "--role", "--result-role", "--seconds",
+                                         "--interop-namespace"};
+    const size_t argc = argv.size();
+    for (size_t i = 0; i < argc; i++)
     {
         std::string s = argv[i];
         std::string opt = s, val;
@@ -423,39 +439,23 @@ void warn_refusals(const Host& host)
         std::cerr << "cimhost: warning: " << line << "\n";
 }
 
-int run(int argc, char** argv)
+void check_verb(const Args& a, bool in_session)
 {
-    for (int i = 1; i < argc; i++)
-        if (strcmp(argv[i], "--help") == 0 || strcmp(argv[i], "-h") == 0)
-        {
-            std::cout << usage_text;
-            return 0;
-        }
-    Args a = read_args(argc, argv);
-    static const char* const verbs[] = {"ei", "ein", "gi", "ai", "an", "ri", "rn", "cm", "listen"};
+    static const char* const verbs[] = {"ei", "ein", "gi", "ai", "an", "ri", "rn", "cm", "listen",
+                                        "session"};
     bool known = false;
     for (const char* v : verbs)
         known = known || a.verb == v;
     if (a.verb.empty())
         bad("no verb given (try --help)");
-    if (!known)
+    if (!known || (in_session && a.verb == "session"))
         bad("unknown verb '" + a.verb + "' (try --help)");
+}
 
-    Options opts;
-    opts.module_path = a.module;
-    opts.reg_path = a.reg;
-    opts.interop = a.interop;
-#ifdef CIMHOST_CLASSES
-    opts.classes = &CIMHOST_CLASSES;
-#endif
-    opts.interop_namespace = a.interop_namespace;
-    opts.pegasus_enumerations = a.pegasus_enumerations;
-    Host host(opts);
-    if (!host.ok())
-    {
-        std::cerr << "cimhost: " << host.error() << "\n";
-        return 1;
-    }
+// One verb on a loaded host, printed as the command prints it; its exit
+// status. Bad input throws.
+int execute(Host& host, const Args& a)
+{
     if (a.verb == "listen")
     {
         int status = listen(host, a);
@@ -511,6 +511,146 @@ int run(int argc, char** argv)
         return 1;
     }
     return 0;
+}
+
+// The words of a session line, split as a POSIX shell splits them: quotes
+// group and are removed, a backslash takes the next character literally
+// (inside double quotes only before $, `, ", \\ and a newline).
+std::vector<std::string> split_words(const std::string& line)
+{
+    std::vector<std::string> words;
+    std::string cur;
+    bool have = false;
+    for (size_t i = 0; i < line.size(); i++)
+    {
+        char c = line[i];
+        if (c == ' ' || c == '\t' || c == '\r')
+        {
+            if (have)
+                words.push_back(cur);
+            cur.clear();
+            have = false;
+        }
+        else if (c == '\'')
+        {
+            size_t end = line.find('\'', i + 1);
+            if (end == std::string::npos)
+                bad("unterminated ' in the line");
+            cur += line.substr(i + 1, end - i - 1);
+            have = true;
+            i = end;
+        }
+        else if (c == '"')
+        {
+            have = true;
+            for (i++;; i++)
+            {
+                if (i >= line.size())
+                    bad("unterminated \" in the line");
+                if (line[i] == '"')
+                    break;
+                if (line[i] == '\\' && i + 1 < line.size() &&
+                    std::string("$`\"\\").find(line[i + 1]) != std::string::npos)
+                    i++;
+                cur += line[i];
+            }
+        }
+        else if (c == '\\')
+        {
+            if (i + 1 < line.size())
+                cur += line[++i];
+            have = true;
+        }
+        else
+        {
+            cur += c;
+            have = true;
+        }
+    }
+    if (have)
+        words.push_back(cur);
+    return words;
+}
+
+// "sleep SECONDS", the one verb of a session alone.
+void session_sleep(const std::vector<std::string>& words)
+{
+    char* end = nullptr;
+    double seconds = words.size() == 2 ? strtod(words[1].c_str(), &end) : -1;
+    if (words.size() != 2 || !end || *end || !(seconds >= 0) || seconds > 86400)
+        bad("sleep takes a number of seconds");
+    std::this_thread::sleep_for(std::chrono::duration<double>(seconds));
+}
+
+// Reads verbs from standard input until its end, on one host.
+int session(Host& host)
+{
+    int worst = 0;
+    std::string line;
+    while (std::getline(std::cin, line))
+    {
+        size_t first = line.find_first_not_of(" \t\r");
+        if (first == std::string::npos || line[first] == '#')
+            continue;
+        int status = 0;
+        try
+        {
+            std::vector<std::string> words = split_words(line);
+            if (words[0] == "sleep")
+                session_sleep(words);
+            else
+            {
+                for (const std::string& w : words)
+                    for (const char* o : session_wide)
+                        if (w == o || w.compare(0, strlen(o) + 1, std::string(o) + "=") == 0)
+                            bad(std::string(o) + " holds for the whole session; give it "
+                                "before the verb session");
+                Args a = read_args(words);
+                check_verb(a, true);
+                status = execute(host, a);
+            }
+        }
+        catch (const Bad_Input& e)
+        {
+            std::cerr << "cimhost: " << e.message << "\n";
+            status = 2;
+        }
+        std::cout << std::flush;
+        std::cerr << std::flush;
+        worst = std::max(worst, status);
+    }
+    return worst;
+}
+
+int run(int argc, char** argv)
+{
+    for (int i = 1; i < argc; i++)
+        if (strcmp(argv[i], "--help") == 0 || strcmp(argv[i], "-h") == 0)
+        {
+            std::cout << usage_text;
+            return 0;
+        }
+    Args a = read_args(std::vector<std::string>(argv + 1, argv + argc));
+    check_verb(a, false);
+    if (a.verb == "session" && !a.positional.empty())
+        bad("session takes no arguments: it reads its verbs from standard input");
+
+    Options opts;
+    opts.module_path = a.module;
+    opts.reg_path = a.reg;
+    opts.interop = a.interop;
+#ifdef CIMHOST_CLASSES
+    opts.classes = &CIMHOST_CLASSES;
+#endif
+    opts.interop_namespace = a.interop_namespace;
+    opts.pegasus_enumerations = a.pegasus_enumerations;
+    Host host(opts);
+    if (!host.ok())
+    {
+        std::cerr << "cimhost: " << host.error() << "\n";
+        return 1;
+    }
+    return a.verb == "session" ? session(host) : execute(host, a);
 }
 
 } // namespace

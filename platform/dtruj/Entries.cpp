@@ -60,6 +60,7 @@ bool applyFault(const char* entry, Json::Value& reply)
 
 Json::Value call(const char* entry, const Json::Value& req, Handler h)
 {
+    recordCall(entry, req);
     Json::Value reply;
     if (applyFault(entry, reply) || echoReply(entry, req, reply))
         return reply;
@@ -635,9 +636,8 @@ JSON_ENTRY(getHbaByMac) { return hbaBy(s, firstOf(req, {"mac", "wwn", "indexStr"
 JSON_ENTRY(getAdapterId)
 {
     std::string addr = firstOf(req, {"indexStr", "wwn", "mac"});
-    int id = 0;
-    if (!findAdapter(s, addr, &id))
-        return notFound("adapter", addr);
+    int id = 0;     // 0: no adapter has this address
+    findAdapter(s, addr, &id);
     Json::Value r(Json::objectValue);
     r["adapterId"] = id;
     return r;
@@ -1847,6 +1847,7 @@ namespace {
 Json::Value runDirect(const char* entry, const Json::Value& req,
                       Json::Value (*prepare)(State&, const Json::Value&, int&))
 {
+    recordCall(entry, req);
     Json::Value reply;
     if (applyFault(entry, reply) || echoReply(entry, req, reply))
         return reply;
@@ -2016,8 +2017,8 @@ DTRUJ_API int dtruj_sim_set_fault(const char* entry, const char* kind)
     return 0;
 }
 
-// Reloads the host description and forgets faults, runs and resets. The
-// library stays initialised if it was.
+// Reloads the host description and forgets faults, runs, resets and the
+// calls it got. The library stays initialised if it was.
 DTRUJ_API int dtruj_sim_reset()
 {
     State& s = state();
@@ -2030,6 +2031,7 @@ DTRUJ_API int dtruj_sim_reset()
     }
     s.lastRequestId = 0;
     resetEcho();
+    clearCalls();
     return 0;
 }
 

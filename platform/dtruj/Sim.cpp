@@ -564,6 +564,10 @@ Json::Value fcPortReply(const Json::Value& a, const Json::Value& p)
     r["trunkingEnabled"] = p["trunking"]["enabled"];
     r["numOfVports"] = Json::UInt(p["vports"].size());
     r["numOfRemotePorts"] = Json::UInt(p["remotePorts"].size());
+    // Only a converged adapter's FC ports (FCoE) say what they are; an FC
+    // HBA's port has no such member, whatever its description says.
+    if (!adapterIsCNA(a))
+        r.removeMember("isFCoE");
     overlayUnchecked(r, p);
     return r;
 }

@@ -172,6 +172,10 @@ void portEvent(State& s, int category, int id, const std::string& portAddr,
 bool startEvents(State& s, bool dropOld);
 void stopEvents(State& s);
 
+// The call log (Calls.cpp): every JSON entry records its request.
+void recordCall(const char* entry, const Json::Value& req);
+void clearCalls();
+
 // Faults. takeFault picks the fault of an entry for this call, if any.
 bool takeFault(State& s, const char* entry, Fault& f);
 bool parseFault(const Json::Value& v, Fault& f, std::string& err);

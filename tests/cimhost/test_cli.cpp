@@ -38,7 +38,8 @@ std::string slurp(const std::string& path)
     return ss.str();
 }
 
-Outcome cimhost(const std::vector<std::string>& args, bool with_module = true)
+Outcome cimhost(const std::vector<std::string>& args, bool with_module = true,
+                const std::string& input = "")
 {
     std::string cmd = CIMHOST_EXE;
     if (with_module)
@@ -47,8 +48,11 @@ Outcome cimhost(const std::vector<std::string>& args, bool with_module = true)
         cmd += " " + quote(a);
     std::string out = "/tmp/cimhost_cli_out." + std::to_string(getpid());
     std::string err = "/tmp/cimhost_cli_err." + std::to_string(getpid());
-    int rc = system((cmd + " >" + out + " 2>" + err).c_str());
+    std::string in = "/tmp/cimhost_cli_in." + std::to_string(getpid());
+    std::ofstream(in) << input;
+    int rc = system((cmd + " <" + in + " >" + out + " 2>" + err).c_str());
     Outcome r {WIFEXITED(rc) ? WEXITSTATUS(rc) : -1, slurp(out), slurp(err)};
+    remove(in.c_str());
     remove(out.c_str());
     remove(err.c_str());
     return r;
@@ -71,7 +75,7 @@ TEST(CimhostCli, HelpDocumentsEveryVerbAndOption)
     Outcome r = cimhost({"--help"}, false);
     EXPECT_EQ(0, r.status);
     for (const char* word : {" ei ", " ein ", " gi ", " ai ", " an ", " ri ", " rn ", " cm ",
-                             " listen ", "--module", "--reg", "--json", "--props", "--assoc-class",
+                             " listen ", " session ", "--module", "--reg", "--json", "--props", "--assoc-class",
                              "--result-class", "--role", "--result-role", "--seconds",
                              "--no-interop"})
         EXPECT_NE(std::string::npos, r.out.find(word)) << word;
@@ -178,4 +182,43 @@ TEST(CimhostCli, ListenPrintsIndicationsAndUnsubscribes)
     ASSERT_GE(j["indications"].size(), 3u);
     EXPECT_EQ("root/test", j["indications"][0]["namespace"].asString());
     EXPECT_EQ("Test_Event", j["indications"][0]["instance"]["class"].asString());
+}
+
+TEST(CimhostCli, ASessionAnswersEachLineAsTheCommandWould)
+{
+    // The same verbs one by one, for what the session must print.
+    const std::vector<std::vector<std::string>> verbs = {
+        {"ei", "root/test:Test_Widget", "--props", "Size"},
+        {"--json", "cm", widget_a, "Double", "X=21"},
+        {"an", "--result-class", "Test_Widget", "root/test:Test_Gadget.Id=2"},
+    };
+    std::string expected;
+    for (const auto& v : verbs)
+        expected += cimhost(v).out;
+
+    const std::string input =
+        "# a comment, then a blank line\n"
+        "\n"
+        "ei root/test:Test_Widget --props Size\n"
+        "frobnicate\n"
+        "  --json cm 'root/test:Test_Widget.Name=\"a\"' Double X=21\n"
+        "sleep 0.05\n"
+        "--module /elsewhere.so ei root/test:Test_Widget\n"
+        "an --result-class Test_Widget \"root/test:Test_Gadget.Id=2\"\n"
+        "gi root/test:Test_Widget.Name=\\\"zz\\\"\n";
+    Outcome r = cimhost({"session"}, true, input);
+
+    EXPECT_EQ(expected, r.out);
+    // The unknown verb and the session-wide option are bad input, the
+    // missing instance a failure: each one line, and the worst status wins.
+    EXPECT_EQ(2, r.status);
+    EXPECT_EQ(3, std::count(r.err.begin(), r.err.end(), '\n')) << r.err;
+    EXPECT_NE(std::string::npos, r.err.find("unknown verb 'frobnicate'")) << r.err;
+    EXPECT_NE(std::string::npos, r.err.find("--module holds for the whole session")) << r.err;
+    EXPECT_NE(std::string::npos, r.err.find("CMPI_RC_ERR_NOT_FOUND")) << r.err;
+
+    EXPECT_EQ(0, cimhost({"session"}, true, "ei root/test:Test_Widget\n").status);
+    EXPECT_EQ(2, cimhost({"session", "extra"}).status);
+    EXPECT_EQ(2, cimhost({"session"}, true, "sleep soon\n").status);
+    EXPECT_EQ(2, cimhost({"session"}, true, "ei 'root/test:Test_Widget\n").status);
 }

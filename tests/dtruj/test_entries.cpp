@@ -113,6 +113,7 @@ TEST_F(DtrujEntries, AdaptersAndTheirDetails)
     EXPECT_TRUE(isError(lib.call("getHbaByWwn", obj({{"wwn", "20:00:00:00:00:00:00:99"}}))));
 
     EXPECT_EQ(2, lib.call("getAdapterId", obj({{"indexStr", CNA}}))["adapterId"].asInt());
+    EXPECT_EQ(0, lib.call("getAdapterId", obj({{"indexStr", "20:00:00:00:00:00:00:99"}}))["adapterId"].asInt());
     EXPECT_EQ(1, lib.call("getAdapterIdByPort", obj({{"indexStr", FC_PORT1}}))["adapterId"].asInt());
     EXPECT_EQ(2, lib.call("getAdapterIdByPort", obj({{"indexStr", ETH_PORT}}))["adapterId"].asInt());
     EXPECT_EQ(0, lib.call("getAdapterIdByPort", obj({{"indexStr", "00:00:00:00:00:01"}}))["adapterId"].asInt());
@@ -162,8 +163,11 @@ TEST_F(DtrujEntries, FcPortMembersAndSpeeds)
     for (const char* m : {"portTypeMOFValue", "maxFrameSize", "portStatusValue"})
         EXPECT_TRUE(p[m].isInt()) << m;
     EXPECT_EQ(11, p["portStatusValue"].asInt());
-    for (const char* m : {"isFCoE", "isMezz", "beaconState", "portStatus"})
+    for (const char* m : {"isMezz", "beaconState", "portStatus"})
         EXPECT_TRUE(p[m].isBool()) << m;
+    // Only a CNA's FC ports say whether they are FCoE, even where an HBA's
+    // port description has the member.
+    EXPECT_FALSE(p.isMember("isFCoE"));
     EXPECT_FALSE(p.isMember("remotePorts"));   // served by their own entries
 
     EXPECT_TRUE(lib.call("getPortByWwn", obj({{"wwn", FCOE_PORT}}))["isFCoE"].asBool());

@@ -38,7 +38,8 @@ const char* const HOST = R"({ "adapters": [
         "operatingSpeed": 8, "supportedPortSpeeds": [8], "linkUp": false, "beaconState": false } ] },
   { "hbaData": { "wwn": "20:00:00:00:c9:bb:00:00", "isMezz": true },
     "fcPorts": [ { "wwn": "10:00:00:00:c9:bb:00:01", "operatingSpeed": 10,
-                   "supportedPortSpeeds": [99999], "isFCoE": true, "beaconState": false } ] } ] })";
+                   "supportedPortSpeeds": [99999], "beaconState": false,
+                   "unchecked": { "isFCoE": true } } ] } ] })";
 
 const char* const LEFT = "10000000c9aa0001";
 const char* const RIGHT = "10000000c9aa0002";
