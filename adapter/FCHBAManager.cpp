@@ -7,6 +7,7 @@
 #include "PhysicalAssetHelper.h"
 #include "PortHelper.h"
 #include "ProviderUtil.h"
+#include "SoftwareUpdateHelper.h"
 #include "log.h"
 
 namespace OLMA
@@ -22,7 +23,7 @@ FCHBAManager::FCHBAManager() :
     portHelper(PortHelper::getPortHelperObject()),
     commonHelper(CommonHelper::getCommonHelperObject()),
     accessPointHelper(AccessPointHelper::getAccessPointHelperInstance()),
-    softwareUpdateHelper(0),
+    softwareUpdateHelper(SoftwareUpdateHelper::getSoftwareUpdateHelperInstance()),
     ethernetPortHelper(EthernetPortHelper::getEthernetPortHelperObject()),
     diagnosticHelper(0),
     physicalAssetHelper(PhysicalAssetHelper::getPhysicalAssetHelperObject())
@@ -41,9 +42,9 @@ FCHBAManager* FCHBAManager::getFCHBAManager()
 // INVENTORY DISPATCH
 //
 // The one place where a class id meets the helper that builds its
-// instances. The driver status has been checked by the caller. The software
-// update and diagnostic helpers aren't part of the module yet: their classes
-// answer with no instances until they are wired in here.
+// instances. The driver status has been checked by the caller. The
+// diagnostic helper isn't part of the module yet: its classes answer with no
+// instances until it is wired in here.
 //------------------------------------------------------------------------------
 
 Array<Instance*> FCHBAManager::_serve(classId_t id)
@@ -71,8 +72,7 @@ Array<Instance*> FCHBAManager::_serve(classId_t id)
 
         case ID_VESPERA_HBASoftwareInstallationService:
         case ID_VESPERA_HBASoftwareInstallationServiceCapabilities:
-            // SoftwareUpdateHelper
-            return Array<Instance*>();
+            return softwareUpdateHelper->getInstancesByClass(id);
 
         case ID_VESPERA_EthernetPort:
         case ID_VESPERA_LANEndpoint:
