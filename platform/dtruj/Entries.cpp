@@ -799,7 +799,7 @@ JSON_ENTRY(getFlashInfo)
 
 namespace {
 
-const int FLASH_DEFAULT_MS = 2000;
+const int FLASH_DEFAULT_MS = 1000;
 
 // The version an image names in a line "version=<text>" near its start, or
 // "" if none. Only the start is read: an image is large and mostly binary.
@@ -866,7 +866,8 @@ Json::Value prepFlash(State& s, const Json::Value& req, FlashJob& job)
     if (job.version.empty())
         job.version = nextVersion(str(ro(*a)["firmware"], "version"));
     r["status"] = 0;
-    r["message"] = "Flash updated to firmware version " + job.version;
+    r["message"] = "Flash updated to firmware version " + job.version + " (" +
+                   std::to_string((long long)st.st_size) + " bytes)";
     return r;
 }
 
