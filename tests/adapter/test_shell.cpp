@@ -103,14 +103,16 @@ TEST_F(Shell, TftpRefusesAnythingButPlainNames)
         EXPECT_EQ(std::string::npos, log.text().find("\nb\""));
     }
 
+    const std::string longPath(1100, 'f'), longLabel(64, 'a');
+
     for (const char* name : { "/etc/passwd", "../x", "a/../../x", "..", ".", "a/./b", "a//b",
-             "a/", "a/-rf", "host:file", std::string(1100, 'f').c_str() })
+             "a/", "a/-rf", "host:file", longPath.c_str() })
         EXPECT_FALSE(ProviderUtil::isSafeRelativePath(name)) << name;
     for (const char* name : { "fw.bin", "a/b/c-1.2_3+4.img", "..a/b..", ".hidden" })
         EXPECT_TRUE(ProviderUtil::isSafeRelativePath(name)) << name;
 
     for (const char* name : { "host:69", "a_b", "a-", "-a", "a..b", ".a", "a.", "1.2.3.4/8",
-             "[::1]", "::g", std::string(64, 'a').c_str() })
+             "[::1]", "::g", longLabel.c_str() })
         EXPECT_FALSE(ProviderUtil::isPlainHost(name)) << name;
     for (const char* name : { "tf", "tftp-1.example.com", "10.0.0.7", "::1", "fe80::1:2" })
         EXPECT_TRUE(ProviderUtil::isPlainHost(name)) << name;
