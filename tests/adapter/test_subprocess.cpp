@@ -47,27 +47,6 @@ void onChld(int) { chldSeen = chldSeen + 1; }
 
 } // namespace
 
-TEST(Subprocess, ReportsExitOutputAndDirectory)
-{
-    std::string dir = makeHome();
-    SubprocessOutcome o = runShell("pwd; echo oops >&2; cat; exit 3", 10000, dir.c_str());
-
-    // stdin is /dev/null, so cat ends at once.
-    EXPECT_FALSE(o.timedOut);
-    EXPECT_TRUE(o.statusKnown);
-    EXPECT_EQ(3, o.exitCode);
-    EXPECT_EQ(dir + "\noops\n", std::string(o.output));
-
-    // A talkative program isn't held up by a full pipe; the start is kept.
-    o = runShell("i=0; while [ $i -lt 2000 ]; do echo 0123456789; i=$((i+1)); done");
-    EXPECT_EQ(0, o.exitCode);
-    EXPECT_EQ(sizeof(o.output) - 1, strlen(o.output));
-
-    o = runShell("kill -TERM $$");
-    EXPECT_EQ(SIGTERM, o.signal);
-    EXPECT_EQ(-1, o.exitCode);
-}
-
 TEST(Subprocess, KillsWhatOutlivesTheDeadline)
 {
     std::string dir = makeHome();
@@ -80,6 +59,7 @@ TEST(Subprocess, KillsWhatOutlivesTheDeadline)
 
     EXPECT_TRUE(o.timedOut);
     EXPECT_EQ(SIGKILL, o.signal);
+    EXPECT_EQ(-1, o.exitCode);
     EXPECT_LT(seconds, 5.0);
 
     pid_t self = atoi(readFile(dir + "/self").c_str());
@@ -156,28 +136,4 @@ TEST(Subprocess, StartsCleanWhateverTheServerSetUp)
     pthread_sigmask(SIG_SETMASK, &old, 0);
     signal(SIGPIPE, SIG_DFL);
     close(57);
-}
-
-TEST(Subprocess, FindsProgramsOnAbsolutePathEntriesOnly)
-{
-    std::string dir = makeHome();
-    std::string fake = dir + "/only-here";
-    writeFile(fake, "#!/bin/sh\necho found\n");
-    chmod(fake.c_str(), 0700);
-    ASSERT_EQ(0, chdir(dir.c_str()));
-
-    std::string saved = getenv("PATH");
-    const char* argv[] = { "only-here", 0 };
-    SubprocessOutcome o;
-
-    setenv("PATH", ".:bin", 1);
-    InProcessLog log;
-    EXPECT_EQ(-1, runSubprocess("only-here", argv, 0, 1000, o));
-    EXPECT_EQ(1u, countLines(log.text(), {"ERR: ", "only-here not found on the PATH"}));
-
-    setenv("PATH", (".:" + dir).c_str(), 1);
-    EXPECT_EQ(0, runSubprocess("only-here", argv, 0, 1000, o));
-    EXPECT_STREQ("found\n", o.output);
-
-    setenv("PATH", saved.c_str(), 1);
 }

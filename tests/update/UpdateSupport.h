@@ -4,7 +4,6 @@
 #ifndef _VSPR_update_UpdateSupport_h
 #define _VSPR_update_UpdateSupport_h
 
-#include <dirent.h>
 #include <sys/stat.h>
 
 #include "ProvidersSupport.h"
@@ -17,19 +16,6 @@ namespace update_test
 {
 
 using namespace providers_test;
-
-inline std::vector<std::string> entriesOf(const std::string& dir)
-{
-    std::vector<std::string> names;
-    if (DIR* d = opendir(dir.c_str()))
-    {
-        while (struct dirent* e = readdir(d))
-            if (strcmp(e->d_name, ".") != 0 && strcmp(e->d_name, "..") != 0)
-                names.push_back(e->d_name);
-        closedir(d);
-    }
-    return names;
-}
 
 inline size_t flashAttempts()
 {
@@ -52,7 +38,7 @@ protected:
 
     void TearDown() override
     {
-        EXPECT_EQ(std::vector<std::string>(), entriesOf(tmp)) << "a download directory stayed";
+        EXPECT_TRUE(std::filesystem::is_empty(tmp)) << "a download directory stayed";
         ProvidersTest::TearDown();
     }
 
@@ -108,11 +94,6 @@ protected:
         EXPECT_EQ(CMPI_RC_OK, r.rc) << ch::rc_name(r.rc) << " " << r.message;
         EXPECT_EQ(CMPI_uint32, r.return_value.type);
         return r.return_value.num.uint32;
-    }
-
-    static uint32_t install(const std::string& uri, const ch::Object_Path& target)
-    {
-        return install(uri, &target);
     }
 
     // The firmware version that the inventory shows for the adapter whose
