@@ -8,6 +8,7 @@
 #include "PhysicalAssetHelper.h"
 #include "PortHelper.h"
 #include "ProviderUtil.h"
+#include "SoftwareUpdateHelper.h"
 #include "log.h"
 
 namespace OLMA
@@ -23,7 +24,7 @@ FCHBAManager::FCHBAManager() :
     portHelper(PortHelper::getPortHelperObject()),
     commonHelper(CommonHelper::getCommonHelperObject()),
     accessPointHelper(AccessPointHelper::getAccessPointHelperInstance()),
-    softwareUpdateHelper(0),
+    softwareUpdateHelper(SoftwareUpdateHelper::getSoftwareUpdateHelperInstance()),
     ethernetPortHelper(EthernetPortHelper::getEthernetPortHelperObject()),
     diagnosticHelper(DiagnosticHelper::getDiagnosticHelperObject()),
     physicalAssetHelper(PhysicalAssetHelper::getPhysicalAssetHelperObject())
@@ -42,9 +43,7 @@ FCHBAManager* FCHBAManager::getFCHBAManager()
 // INVENTORY DISPATCH
 //
 // The one place where a class id meets the helper that builds its
-// instances. The driver status has been checked by the caller. The software
-// update helper isn't part of the module yet: its classes answer with no
-// instances until it is wired in here.
+// instances. The driver status has been checked by the caller.
 //------------------------------------------------------------------------------
 
 Array<Instance*> FCHBAManager::_serve(classId_t id)
@@ -72,8 +71,7 @@ Array<Instance*> FCHBAManager::_serve(classId_t id)
 
         case ID_VESPERA_HBASoftwareInstallationService:
         case ID_VESPERA_HBASoftwareInstallationServiceCapabilities:
-            // SoftwareUpdateHelper
-            return Array<Instance*>();
+            return softwareUpdateHelper->getInstancesByClass(id);
 
         case ID_VESPERA_EthernetPort:
         case ID_VESPERA_LANEndpoint:

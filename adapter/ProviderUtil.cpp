@@ -20,6 +20,7 @@
 #include "CIMProviderTruj.h"
 #include "ProviderInit.h"
 #include "Strings.h"
+#include "Subprocess.h"
 #include "dtruj.h"
 #include "log.h"
 
@@ -325,93 +326,161 @@ bool ProviderUtil::IsFileExist(const char* path)
 // Running tftp
 //------------------------------------------------------------------------------
 
-// The names go into a shell command line. Only characters that no shell
-// treats specially are let through, a leading '-' would be read as an
-// option, and the file must stay below the working directory since it is
-// removed there before the download.
-static bool _safeHost(const char* host)
+// How long one download may take. The client gives up by itself after some
+// 25 seconds without an answer; this bounds a transfer that trickles on, or
+// a client that hangs, while the CIM request waits for it.
+static const int TFTP_TIMEOUT_MS = 300 * 1000;
+
+// Plain ASCII, whatever locale the server runs in.
+static bool _isAsciiAlnum(unsigned char c)
 {
-    if (!host || !*host || host[0] == '-')
-        return false;
-
-    for (const char* p = host; *p; p++)
-    {
-        unsigned char c = *p;
-
-        if (!(isalnum(c) || c == '.' || c == '-' || c == '_' || c == ':'))
-            return false;
-    }
-
-    return true;
+    return (c >= 'a' && c <= 'z') || (c >= 'A' && c <= 'Z') || (c >= '0' && c <= '9');
 }
 
-static bool _safeFile(const char* file)
+bool ProviderUtil::isPlainHost(const char* host)
 {
-    if (!file || !*file || file[0] == '-' || file[0] == '/')
+    if (!host || !*host || strlen(host) > 253)
         return false;
 
-    for (const char* p = file; *p; p++)
+    // An IPv6 literal, as the client takes it.
+    if (strchr(host, ':'))
     {
-        unsigned char c = *p;
-
-        if (!(isalnum(c) || c == '.' || c == '-' || c == '_' || c == '/' ||
-            c == '+'))
-            return false;
+        struct in6_addr addr;
+        return strspn(host, "0123456789abcdefABCDEF:.") == strlen(host) &&
+            inet_pton(AF_INET6, host, &addr) == 1;
     }
 
-    // No ".." component anywhere.
-    for (const char* p = file; (p = strstr(p, "..")) != 0; p++)
-    {
-        bool atStart = p == file || p[-1] == '/';
-        bool atEnd = p[2] == '\0' || p[2] == '/';
+    // A name or a dotted IPv4 address: labels of letters, digits and inner
+    // hyphens, so that nothing can read as an option or a second word.
+    const char* label = host;
 
-        if (atStart && atEnd)
+    for (const char* p = host; ; p++)
+    {
+        if (*p == '.' || *p == '\0')
+        {
+            size_t n = (size_t)(p - label);
+
+            if (n == 0 || n > 63 || label[0] == '-' || p[-1] == '-')
+                return false;
+
+            if (*p == '\0')
+                return true;
+
+            label = p + 1;
+        }
+        else if (!_isAsciiAlnum((unsigned char)*p) && *p != '-')
             return false;
     }
-
-    return true;
 }
 
-int ProviderUtil::TftpGetFile(const char* server, const char* file)
+bool ProviderUtil::isSafeRelativePath(const char* path)
 {
-    if (!_safeHost(server))
+    if (!path || !*path || path[0] == '/' || strlen(path) > 1000)
+        return false;
+
+    const char* part = path;
+
+    for (const char* p = path; ; p++)
+    {
+        if (*p == '/' || *p == '\0')
+        {
+            size_t n = (size_t)(p - part);
+
+            if (n == 0 || part[0] == '-' ||
+                (n == 1 && part[0] == '.') ||
+                (n == 2 && part[0] == '.' && part[1] == '.'))
+                return false;
+
+            if (*p == '\0')
+                return true;
+
+            part = p + 1;
+        }
+        else
+        {
+            unsigned char c = *p;
+
+            if (!(_isAsciiAlnum(c) || c == '.' || c == '_' || c == '-' || c == '+'))
+                return false;
+        }
+    }
+}
+
+int ProviderUtil::TftpGetFile(const char* server, const char* file, const char* dir,
+    String& copy)
+{
+    char shown[256];
+    copy.clear();
+
+    if (!isPlainHost(server))
     {
         TLOG(LL_ERR, "TftpGetFile: refused host name \"%s\"",
-            server ? server : "");
+            printableText(server, shown, sizeof(shown)));
         return -1;
     }
 
-    if (!_safeFile(file))
+    if (!isSafeRelativePath(file))
     {
-        TLOG(LL_ERR, "TftpGetFile: refused file name \"%s\"", file ? file : "");
+        TLOG(LL_ERR, "TftpGetFile: refused file name \"%s\"",
+            printableText(file, shown, sizeof(shown)));
         return -1;
     }
 
-    char command[1024];
-
-    int n = snprintf(command, sizeof(command), "rm -f %s", file);
-
-    if (n < 0 || (size_t)n >= sizeof(command))
+    if (!dir || dir[0] != '/')
     {
-        TLOG(LL_ERR, "TftpGetFile: file name too long");
+        TLOG(LL_ERR, "TftpGetFile: no directory to download into");
         return -1;
     }
 
-    // An earlier copy must not pass for the new one; whether rm found
-    // anything doesn't matter.
-    int rc = system(command);
-    (void)rc;
+    // The client names its copy after the last part of the path, in the
+    // directory it runs in.
+    const char* name = strrchr(file, '/');
+    name = name ? name + 1 : file;
+    String local(dir);
+    local.append("/");
+    local.append(name);
 
-    n = snprintf(command, sizeof(command), "tftp %s -c get %s", server, file);
+    const char* argv[] = { "tftp", server, "-c", "get", file, 0 };
+    TLOG(LL_DBG, "TftpGetFile: tftp %s -c get %s (in %s)", server, file, dir);
 
-    if (n < 0 || (size_t)n >= sizeof(command))
+    SubprocessOutcome outcome;
+
+    if (runSubprocess("tftp", argv, dir, TFTP_TIMEOUT_MS, outcome) != 0)
+        return -1;
+
+    char said[sizeof(outcome.output)];
+    printableText(outcome.output, said, sizeof(said));
+
+    if (outcome.timedOut)
     {
-        TLOG(LL_ERR, "TftpGetFile: host and file names too long");
+        TLOG(LL_ERR, "TftpGetFile: tftp didn't finish within %d seconds; stopped",
+            TFTP_TIMEOUT_MS / 1000);
         return -1;
     }
 
-    TLOG(LL_DBG, "TftpGetFile: %s", command);
-    return system(command);
+    if (outcome.statusKnown && outcome.exitCode != 0)
+    {
+        TLOG(LL_ERR, "TftpGetFile: tftp failed (exit %d, signal %d): %s",
+            outcome.exitCode, outcome.signal, said);
+        return outcome.exitCode > 0 ? outcome.exitCode : -1;
+    }
+
+    // The client exits with 0 also when the host is unknown or the server
+    // has no such file, and may leave an empty file then: only a copy with
+    // content counts.
+    struct stat st;
+
+    if (lstat(local.c_str(), &st) != 0 || !S_ISREG(st.st_mode) || st.st_size == 0)
+    {
+        TLOG(LL_ERR, "TftpGetFile: no copy of %s arrived from %s: %s", file, server, said);
+        return -1;
+    }
+
+    if (said[0])
+        TLOG(LL_INFO, "TftpGetFile: tftp said: %s", said);
+
+    copy = local;
+    return 0;
 }
 
 //------------------------------------------------------------------------------

@@ -45,10 +45,23 @@ public:
 
     bool IsFileExist(const char* path);
 
-    // Fetches file from server with the tftp client into the working
-    // directory. Names that could reach the shell as anything but one plain
-    // word are refused with -1.
-    int TftpGetFile(const char* server, const char* file);
+    // Fetches file from server with the tftp client ("tftp <server> -c get
+    // <file>", started without a shell) into dir, which should be a fresh
+    // directory of the caller's: the copy, named after the last part of
+    // file, lands there and nowhere else. 0 with its path in copy when a
+    // copy with content arrived; otherwise non-zero, after an ERR line. A
+    // server or file that isPlainHost or isSafeRelativePath refuses is
+    // refused before anything runs.
+    int TftpGetFile(const char* server, const char* file, const char* dir, String& copy);
+
+    // A host name, a dotted IPv4 address or an IPv6 literal, and nothing
+    // else: letters, digits, inner hyphens and dots.
+    static bool isPlainHost(const char* host);
+
+    // A relative path of parts made of letters, digits, '.', '_', '-' and
+    // '+', joined by single '/'; no part empty, "." or "..", or starting
+    // with '-'.
+    static bool isSafeRelativePath(const char* path);
 
     // 34568 if the console agent (zarkagent) runs, else 0.
     unsigned int getAgentPort();

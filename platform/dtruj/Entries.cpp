@@ -788,58 +788,132 @@ JSON_ENTRY(getFlashInfo)
     Json::Value r = (*a)["flash"];
     r.removeMember("updateStatus");
     r.removeMember("updateMessage");
+    r.removeMember("durationMs");
     copyIfAny(r, "firmwareVersion", ro(*a)["firmware"], "version");
     copyIfAny(r, "biosVersion", ro(*a)["firmware"]);
     return r;
 }
 
-JSON_ENTRY(adapterUpdateFlash)
+// ---------------------------------------------------------------- flash update
+//
+// A flash takes its "durationMs" outside the host lock, as a real one keeps
+// the adapter busy but not the library: the inventory goes on answering,
+// with the old version until the new one is written.
+
+namespace {
+
+const int FLASH_DEFAULT_MS = 1000;
+
+// The version an image names in a line "version=<text>" near its start, or
+// "" if none. Only the start is read: an image is large and mostly binary.
+std::string imageVersion(std::ifstream& in)
+{
+    std::string head(64 * 1024, '\0');
+    in.read(&head[0], (std::streamsize)head.size());
+    head.resize((size_t)in.gcount());
+    size_t pos = 0;
+    for (int i = 0; i < 64 && pos < head.size(); ++i) {
+        size_t end = head.find('\n', pos);
+        if (end == std::string::npos)
+            end = head.size();
+        if (head.compare(pos, 8, "version=") == 0) {
+            std::string v = head.substr(pos + 8, end - pos - 8);
+            while (!v.empty() && isspace((unsigned char)v.back()))
+                v.pop_back();
+            return v;
+        }
+        pos = end + 1;
+    }
+    return std::string();
+}
+
+struct FlashJob {
+    std::string adapter;    // index string; empty when nothing is to be written
+    std::string version;    // the new version on success
+    int delay = 0;
+};
+
+Json::Value prepFlash(State& s, const Json::Value& req, FlashJob& job)
 {
     std::string addr = firstOf(req, {"indexStr", "wwn", "mac"});
     Json::Value* a = findAdapter(s, addr);
     if (!a)
         return notFound("adapter", addr);
+    std::string index = adapterIndex(*a);
     std::string file = str(req, "file");
     Json::Value r(Json::objectValue);
     std::ifstream in(file.c_str(), std::ios::binary);
-    if (file.empty() || !in) {
+    struct stat st;
+    if (file.empty() || !in || stat(file.c_str(), &st) != 0 || !S_ISREG(st.st_mode)) {
         r["status"] = 2;
         r["message"] = "Cannot open image file " + file;
-        s.updateLog.push_back(adapterIndex(*a) + ": " + r["message"].asString());
+        s.updateLog.push_back(index + ": " + r["message"].asString());
+        return r;
+    }
+    if (s.flashing.count(index)) {
+        r["status"] = 3;
+        r["message"] = "A flash update of this adapter is already running";
+        s.updateLog.push_back(index + ": " + r["message"].asString());
         return r;
     }
     const Json::Value& fl = ro(*a)["flash"];
+    job.adapter = index;
+    job.delay = fl.isMember("durationMs") ? fl["durationMs"].asInt() : FLASH_DEFAULT_MS;
+    s.flashing.insert(index);
     if (fl.isMember("updateStatus") && fl["updateStatus"].asInt() != 0) {
         r["status"] = fl["updateStatus"].asInt();
         r["message"] = fl.get("updateMessage", "Flash write failed").asString();
-        s.updateLog.push_back(adapterIndex(*a) + ": " + r["message"].asString());
         return r;
     }
-    // An image may name its version in a line "version=<text>"; otherwise
-    // the last number of the current version goes up by one.
-    std::string version;
-    std::string line;
-    for (int i = 0; i < 64 && std::getline(in, line); ++i)
-        if (line.compare(0, 8, "version=") == 0) {
-            version = line.substr(8);
-            while (!version.empty() && isspace((unsigned char)version.back()))
-                version.pop_back();
-            break;
-        }
-    if (version.empty())
-        version = nextVersion(str(ro(*a)["firmware"], "version"));
-    (*a)["firmware"]["version"] = version;
+    job.version = imageVersion(in);
+    if (job.version.empty())
+        job.version = nextVersion(str(ro(*a)["firmware"], "version"));
     r["status"] = 0;
-    r["message"] = "Flash updated to firmware version " + version;
-    s.updateLog.push_back(adapterIndex(*a) + ": " + r["message"].asString());
-    SIMLOG(SL_INFO, "%s", r["message"].asString().c_str());
+    r["message"] = "Flash updated to firmware version " + job.version + " (" +
+                   std::to_string((long long)st.st_size) + " bytes)";
     return r;
+}
+
+} // namespace
+
+DTRUJ_API Json::Value adapterUpdateFlash(const Json::Value& req)
+{
+    Json::Value reply;
+    if (applyFault("adapterUpdateFlash", reply))
+        return reply;
+    State& s = state();
+    FlashJob job;
+    {
+        std::lock_guard<std::mutex> g(s.mtx);
+        if (!s.initialised)
+            return errorReply(1, "adapterUpdateFlash: the adapter library is not initialised");
+        if (!req.isNull() && !req.isObject())
+            return errorReply(3, "adapterUpdateFlash: the request is not a JSON object");
+        try {
+            reply = prepFlash(s, req, job);
+        } catch (const Json::Exception& e) {
+            return errorReply(3, std::string("adapterUpdateFlash: malformed value: ") + e.what());
+        }
+        if (job.adapter.empty())
+            return reply;
+        SIMLOG(SL_INFO, "%s: writing the flash (%d ms)", job.adapter.c_str(), job.delay);
+    }
+    sleepMs(job.delay);
+    std::lock_guard<std::mutex> g(s.mtx);
+    s.flashing.erase(job.adapter);
+    // The host may have been reloaded meanwhile; the adapter is found again.
+    Json::Value* a = findAdapter(s, job.adapter);
+    if (a && !job.version.empty())
+        (*a)["firmware"]["version"] = job.version;
+    s.updateLog.push_back(job.adapter + ": " + reply["message"].asString());
+    SIMLOG(SL_INFO, "%s: %s", job.adapter.c_str(), reply["message"].asString().c_str());
+    return reply;
 }
 
 JSON_ENTRY(getDriverUpdateStatus)
 {
     Json::Value r(Json::objectValue);
-    r["status"] = "Idle";
+    r["status"] = s.flashing.empty() ? "Idle" : "Updating";
     r["log"] = Json::Value(Json::arrayValue);
     for (const std::string& l : s.updateLog)
         r["log"].append(l);

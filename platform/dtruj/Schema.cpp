@@ -205,7 +205,7 @@ const Shape firmware = {OBJECT, firmwareMembers, nullptr};
 
 const Member flashMembers[] = {
     {"flashStatus", &boolean}, {"updateStatus", &whole}, {"updateMessage", &text},
-    {nullptr, nullptr}};
+    {"durationMs", &whole}, {nullptr, nullptr}};
 const Shape flash = {OBJECT, flashMembers, nullptr};
 
 const Member adapterAdvDataMembers[] = {

@@ -8,6 +8,7 @@
 #include <deque>
 #include <map>
 #include <mutex>
+#include <set>
 #include <string>
 #include <thread>
 #include <unordered_map>
@@ -82,6 +83,7 @@ struct State {
     int lastRequestId = 0;
     double startTime = 0;
     std::vector<std::string> updateLog;
+    std::set<std::string> flashing;     // adapters whose flash is being written
 
     // Events: a queue filled by injections, setters and the event source
     // file, emptied by the library's own thread.

@@ -1,6 +1,6 @@
-// The operations that run shell commands: a host or file name must never
-// reach the shell as anything but one plain word. Fake rm, tftp and ps first
-// on PATH record how they were called.
+// The operations that run outside programs: a host or file name must reach
+// the tftp client as one plain argument, or not at all. Fake tftp and ps
+// first on PATH record how they were called.
 
 #include <gtest/gtest.h>
 
@@ -26,7 +26,6 @@ protected:
     {
         dir = makeHome();
         calls = dir + "/calls";
-        script("rm", "exit 0");
         script("tftp", "exit 0");
         setenv("PATH", (dir + ":" + getenv("PATH")).c_str(), 1);
         ASSERT_EQ(0, chdir(dir.c_str()));
@@ -46,40 +45,62 @@ protected:
 
 } // namespace
 
-TEST_F(Shell, TftpRunsTwoPlainCommands)
+TEST_F(Shell, TftpRunsTheClientInTheDownloadDirectory)
 {
     ProviderUtil* util = ProviderUtil::getProviderUtil();
-    EXPECT_EQ(0, util->TftpGetFile("tftp-1.example.com", "images/fw_3.2.1-a.bin"));
-    EXPECT_EQ("rm -f images/fw_3.2.1-a.bin\n"
-        "tftp tftp-1.example.com -c get images/fw_3.2.1-a.bin\n", readFile(calls));
+    std::string download = dir + "/download";
+    ASSERT_EQ(0, mkdir(download.c_str(), 0700));
 
-    // The download's status is the result, whatever rm said.
-    script("rm", "exit 1");
-    script("tftp", "exit 3");
-    EXPECT_NE(0, util->TftpGetFile("10.0.0.7", "a..b/fw.1"));
+    // The fake client leaves a copy named after the last part of the path,
+    // as the real one does.
+    script("tftp", "echo \"cwd $(pwd)\" >> '" + calls + "'; printf image > \"${4##*/}\"");
+    String copy;
+    EXPECT_EQ(0, util->TftpGetFile("tftp-1.example.com", "images/fw_3.2.1+a.bin",
+        download.c_str(), copy));
+    EXPECT_EQ("tftp tftp-1.example.com -c get images/fw_3.2.1+a.bin\ncwd " + download + "\n",
+        readFile(calls));
+    EXPECT_STREQ((download + "/fw_3.2.1+a.bin").c_str(), copy.c_str());
+    EXPECT_EQ("image", readFile(download + "/fw_3.2.1+a.bin"));
+
+    // The client's failure is the result, whatever it left behind.
+    script("tftp", "printf image > \"${4##*/}\"; exit 3");
+    EXPECT_EQ(3, util->TftpGetFile("server", "fw.bin", download.c_str(), copy));
+    EXPECT_EQ(0u, copy.size());
 }
 
-TEST_F(Shell, TftpRefusesHostileNames)
+TEST_F(Shell, TftpRefusesAnythingButPlainNames)
 {
     ProviderUtil* util = ProviderUtil::getProviderUtil();
-    const char* const hostile[] = { "a;touch pwned", "$(touch pwned)", "`touch pwned`",
-        "a'b", "a\"b", "a b", "a\nb", "-c", "a|b", "a&b", "a>b", "*", "~root", "" };
+    // The service refuses these first; this is the second line of defence.
+    const char* const hostile[] = { "a;touch pwned", "$(touch pwned)", "a b", "a\nb", "-c", "" };
+    String copy;
 
     for (const char* name : hostile)
     {
         InProcessLog log;
-        EXPECT_EQ(-1, util->TftpGetFile(name, "fw.bin")) << name;
-        EXPECT_EQ(-1, util->TftpGetFile("server", name)) << name;
-        EXPECT_EQ(2u, countLines(log.text(), {"ERR: ", "TftpGetFile"})) << name;
+        EXPECT_EQ(-1, util->TftpGetFile(name, "fw.bin", dir.c_str(), copy)) << name;
+        EXPECT_EQ(-1, util->TftpGetFile("server", name, dir.c_str(), copy)) << name;
+        EXPECT_EQ(2u, countLines(log.text(), {"ERR: ", "TftpGetFile: refused"})) << name;
+        // What came from outside can't forge a line of the log.
+        EXPECT_EQ(std::string::npos, log.text().find("\nb\""));
     }
 
-    // rm -f would reach files outside the working directory.
-    for (const char* name : { "/etc/passwd", "../x", "a/../../x", ".." })
-        EXPECT_EQ(-1, util->TftpGetFile("server", name)) << name;
+    const std::string longPath(1100, 'f'), longLabel(64, 'a');
 
-    // Nor is a command cut short to fit.
-    EXPECT_EQ(-1, util->TftpGetFile("server", std::string(1100, 'f').c_str()));
-    EXPECT_EQ(-1, util->TftpGetFile(0, 0));
+    for (const char* name : { "/etc/passwd", "../x", "a/../../x", "..", ".", "a/./b", "a//b",
+             "a/", "a/-rf", "host:file", longPath.c_str() })
+        EXPECT_FALSE(ProviderUtil::isSafeRelativePath(name)) << name;
+    for (const char* name : { "fw.bin", "a/b/c-1.2_3+4.img", "..a/b..", ".hidden" })
+        EXPECT_TRUE(ProviderUtil::isSafeRelativePath(name)) << name;
+
+    for (const char* name : { "host:69", "a_b", "a-", "-a", "a..b", ".a", "a.", "1.2.3.4/8",
+             "[::1]", "::g", longLabel.c_str() })
+        EXPECT_FALSE(ProviderUtil::isPlainHost(name)) << name;
+    for (const char* name : { "tf", "tftp-1.example.com", "10.0.0.7", "::1", "fe80::1:2" })
+        EXPECT_TRUE(ProviderUtil::isPlainHost(name)) << name;
+
+    EXPECT_EQ(-1, util->TftpGetFile("server", "fw.bin", "relative", copy));
+    EXPECT_EQ(-1, util->TftpGetFile(0, 0, 0, copy));
 
     EXPECT_EQ("", readFile(calls)) << "no command may run";
     struct stat st;
