@@ -144,7 +144,11 @@ void* VESPERA_AlertIndication_Provider::deliverIndications(void* arg)
                 destroy(alert);
             }
             else
+            {
+                TLOG(LL_DBG, "Delivery given up while indications go off; "
+                    "the alert stays queued");
                 manager->returnIndicationObject(alert);
+            }
         }
 
         Time::sleep(DELIVERY_PACE);

@@ -313,3 +313,10 @@ DTRUJ_API unsigned long dtruj_sim_events_delivered(void)
 {
     return state().evDelivered.load();
 }
+
+// The callback registered now, or null: lets a test play a library that
+// still calls it after the caller unregistered.
+DTRUJ_API OLMA::EventProcessCB dtruj_sim_event_callback(void)
+{
+    return eventCallback().load();
+}
