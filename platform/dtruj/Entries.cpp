@@ -447,6 +447,7 @@ DTRUJ_API void registerEventProcessingCb(EventProcessCB cb)
     Json::Value dummy;
     applyFault("registerEventProcessingCb", dummy);
     eventCallback().store(cb);
+    notifyEvents(state());
 }
 
 DTRUJ_API Json::Value init_hba_lib(const Json::Value& req)

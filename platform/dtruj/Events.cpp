@@ -169,6 +169,9 @@ static bool stillRegistered(State* s, unsigned generation)
     return !s->evStop && s->evGeneration == generation;
 }
 
+// Events wait in the queue while no callback is registered, as between
+// register_for_events and registerEventProcessingCb: they go to the first
+// callback that comes, not to nobody.
 static void eventThread(State* s, std::string path, unsigned generation)
 {
     EventSource src;
@@ -190,26 +193,39 @@ static void eventThread(State* s, std::string path, unsigned generation)
             s->evFileOffset = offset;
             for (auto& l : lines)
                 s->evQueue.push_back(l);
-            if (s->evQueue.empty() && !s->evStop)
+            if ((s->evQueue.empty() || !eventCallback().load()) && !s->evStop)
                 s->evCv.wait_for(g, std::chrono::milliseconds(50));
             if (s->evStop || s->evGeneration != generation)
                 break;
+            if (!eventCallback().load())
+                continue;
             batch.swap(s->evQueue);
         }
         // The callback runs without our locks: the module may call back
         // into the library from it. What is left of a burst when the
-        // caller unregisters is dropped, as it is from the queue.
-        for (const std::string& e : batch) {
+        // caller unregisters is dropped, as it is from the queue; when it
+        // only takes its callback back, the rest waits for the next one.
+        size_t done = 0;
+        for (; done < batch.size(); done++) {
             if (!stillRegistered(s, generation))
                 break;
             EventProcessCB cb = eventCallback().load();
-            if (!cb)
-                continue;
-            cb(e.c_str());
+            if (!cb) {
+                std::lock_guard<std::mutex> g(s->evMtx);
+                s->evQueue.insert(s->evQueue.begin(), batch.begin() + long(done), batch.end());
+                break;
+            }
+            cb(batch[done].c_str());
             s->evDelivered++;
         }
     }
     src.close();
+}
+
+void notifyEvents(State& s)
+{
+    std::lock_guard<std::mutex> g(s.evMtx);
+    s.evCv.notify_all();
 }
 
 bool startEvents(State& s, bool dropOld)

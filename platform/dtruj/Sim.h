@@ -172,6 +172,8 @@ void portEvent(State& s, int category, int id, const std::string& portAddr,
                const char* idValue, int severity, const char* msg);
 bool startEvents(State& s, bool dropOld);
 void stopEvents(State& s);
+// Wakes the event thread, for events that waited for a callback.
+void notifyEvents(State& s);
 // The events that a change of the host raises, as the adapter would:
 // enabling or disabling an adapter (its ports that are enabled themselves),
 // the members "portStatus" and "linkUp" that a setter changed on a port,

@@ -162,6 +162,18 @@ TEST_F(DtrujEvents, AdapterAndLinkChangesRaiseWhatTheAdapterWould)
               seen);
 }
 
+TEST_F(DtrujEvents, EventsWaitForACallback)
+{
+    // Registered for events, but no callback yet, as a caller has it for a
+    // moment between the two calls.
+    ASSERT_FALSE(isError(lib.call("register_for_events", obj({{"dropOldEvents", true}}))));
+    ASSERT_EQ(0, lib.inject("{\"eventCategory\":2,\"eventId\":1}"));
+    usleep(100000);
+    EXPECT_EQ(0u, waitFor(0, 0));
+    lib.sym<OLMA::evtProcessCBRetVoidFP>("registerEventProcessingCb")(onEvent);
+    EXPECT_EQ(1u, waitFor(1));
+}
+
 TEST_F(DtrujEvents, UnregisterStopsDelivery)
 {
     subscribe();
