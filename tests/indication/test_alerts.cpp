@@ -466,4 +466,36 @@ TEST_F(Alerts, UnloadTurnsThemOffFirst)
     EXPECT_EQ(std::string::npos, off.text().find("Stopping the indication thread created."));
 }
 
+// What a user watching alerts sees, with events fed through DTRUJ_EVENTS
+// (here a regular file; a FIFO works the same).
+TEST(AlertsCommand, ListenShowsEachAlertAndStopsAtTheCount)
+{
+    std::string dir = workDir();
+    std::string events = dir + "/events.txt";
+    Json::Value down = event(2, 11, "link lost");
+    down["eventSeverity"] = 2;
+    writeFile(events, compact(down) + "\nnot an event\n" + compact(event(8, 1, "audit")) + "\n");
+
+    auto run = [&](const std::string& options) {
+        std::string out = dir + "/listen.out";
+        std::string cmd = "HOME=" + dir + " DTRUJ_EVENTS=" + events + " " CIMHOST_EXE " " +
+                          options + " listen root/vespera:VESPERA_AlertIndication --seconds 20"
+                          " --count 2 >" + out + " 2>&1";
+        EXPECT_EQ(0, system(cmd.c_str())) << readFile(out);
+        return readFile(out);
+    };
+
+    std::string text = run("");
+    EXPECT_NE(std::string::npos, text.find("// alert 1: Critical, VSPR131083: link lost\n")) << text;
+    EXPECT_NE(std::string::npos, text.find("// at //")) << text;
+    EXPECT_NE(std::string::npos, text.find("// alert 2: Information, VSPR524289: audit\n")) << text;
+    EXPECT_NE(std::string::npos, text.find("    Category = \"Audit\";")) << text;
+
+    // A new process reads the file from its start again.
+    Json::Value doc = parseJson(run("--json"));
+    ASSERT_EQ(2u, doc["indications"].size());
+    EXPECT_EQ("CMPI_RC_OK", doc["rc_name"].asString());
+    EXPECT_EQ("VESPERA_AlertIndication", doc["indications"][1]["instance"]["class"].asString());
+}
+
 } // namespace
