@@ -51,7 +51,7 @@ const Catalogue_Row catalogue[] = {
 const Catalogue_Row* row(int category, int id)
 {
     for (const Catalogue_Row& r : catalogue)
-        if (r.key == (category << 16 | id))
+        if (r.key == int(unsigned(category) << 16 | unsigned(id)))
             return &r;
     return nullptr;
 }
