@@ -20,7 +20,6 @@
 extern "C" OLMA::sint32 __tessel_VESPERA_AlertIndication_Provider_proc(
     const OLMA::Registration*, int, void*, void*, void*, void*, void*, void*, void*, void*);
 extern "C" int dtruj_sim_inject_copies(const char* json, int count);
-extern "C" int dtruj_sim_set_fault(const char* entry, const char* kind);
 
 using namespace OLMA;
 
@@ -163,22 +162,6 @@ TEST_F(AlertProvider, AnAlertTheHandlerDeclinesIsOfferedAgainWithItsNumber)
     EXPECT_EQ(r.taken[1] + 1, r.taken[2]);
     for (sint64 number : r.taken)
         EXPECT_EQ(2, r.offers[number]) << number;
-}
-
-TEST_F(AlertProvider, AFailedEnableLeavesNothingRunning)
-{
-    size_t threads = settledThreads();
-    ASSERT_EQ(0, dtruj_sim_set_fault("register_for_events", "error"));
-    Received r;
-    EXPECT_EQ(ENABLE_INDICATIONS_FAILED, enable(r));
-    dtruj_sim_set_fault("register_for_events", nullptr);
-    EXPECT_EQ(threads, threadCount());
-    EXPECT_EQ(DISABLE_INDICATIONS_OK, disable());
-    EXPECT_EQ(0, r.ends.load()) << "a stream that never began doesn't end";
-
-    ASSERT_EQ(ENABLE_INDICATIONS_OK, enable(r));
-    disable();
-    EXPECT_EQ(1, r.ends.load());
 }
 
 } // namespace

@@ -372,17 +372,6 @@ TEST_F(Alerts, GoOutInOrderAtTheDeliveryPace)
         EXPECT_EQ(sequence(got[i - 1]) + 1, sequence(got[i]));
 }
 
-TEST_F(Alerts, EachNamespaceGetsOneCopyWhateverItsFilters)
-{
-    int a = subscribe();
-    int b = subscribe();
-    ASSERT_EQ(1u, alertsOf(listOf({event(2, 1)})).size());
-    ASSERT_TRUE(unsubscribe(a).ok());
-    ASSERT_EQ(1u, alertsOf(listOf({event(2, 1)})).size());
-    ASSERT_TRUE(unsubscribe(b).ok());
-    EXPECT_EQ(-1, dtruj_sim_inject_event("{}")) << "the last filter ends the subscription";
-}
-
 TEST_F(Alerts, ARefusedSubscriptionChangesNothing)
 {
     for (const char* fault : {"error", "hba", "std", "unknown", "null"})
@@ -441,29 +430,6 @@ TEST_F(Alerts, TheHostsOwnChangesRaiseTheirAlerts)
     EXPECT_EQ("3", got[1].get_text("PerceivedSeverity"));
     EXPECT_TRUE(ch::path_equal(devicePath("VESPERA_EthernetPort", ETH_PORT),
                                parsedPath(got[1].get_text("AlertingManagedElement"))));
-}
-
-TEST_F(Alerts, UnloadTurnsThemOffFirst)
-{
-    subscribe();
-    ASSERT_EQ(1u, alertsOf(listOf({event(2, 1)})).size());
-    LogMark on;
-    host->cleanup(false);
-    std::string log = on.text();
-    size_t unload = log.find("VESPERA_AlertIndication_Provider::unload()");
-    size_t stop = log.find("Stopping the indication thread created.");
-    ASSERT_NE(std::string::npos, unload);
-    ASSERT_NE(std::string::npos, stop);
-    EXPECT_LT(unload, stop);
-    EXPECT_NE(std::string::npos, log.find("Unsubscribtion for event notifications is successful."));
-    EXPECT_EQ(-1, dtruj_sim_inject_event("{}"));
-
-    // Off already: an unload only says so.
-    ASSERT_TRUE(unsubscribe(subscribe()).ok());
-    LogMark off;
-    host->cleanup(false);
-    EXPECT_NE(std::string::npos, off.text().find("VESPERA_AlertIndication_Provider::unload()"));
-    EXPECT_EQ(std::string::npos, off.text().find("Stopping the indication thread created."));
 }
 
 // What a user watching alerts sees, with events fed through DTRUJ_EVENTS
