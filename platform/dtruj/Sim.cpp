@@ -1,20 +1,15 @@
 // The simulated host: loading its description, looking things up in it,
-// counters, events and faults.
+// counters and faults. The events are in Events.cpp.
 #include "Sim.h"
 
 #include <cerrno>
-#include <chrono>
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
-#include <fcntl.h>
 #include <fstream>
-#include <poll.h>
 #include <sstream>
 #include <strings.h>
-#include <sys/stat.h>
 #include <sys/time.h>
-#include <unistd.h>
 
 namespace OLMA {
 namespace Sim {
