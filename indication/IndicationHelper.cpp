@@ -205,7 +205,15 @@ IndicationHelper::~IndicationHelper()
     // Unloaded while still subscribed (a server that never disabled us):
     // the library must not call into a module that is going away.
     if (callbackSet)
-        libRegisterEventProcessingCb(0);
+    {
+        try
+        {
+            libRegisterEventProcessingCb(0);
+        }
+        catch (...)
+        {
+        }
+    }
 
     for (VESPERA_AlertIndication* alert : indicationQueue)
         destroy(alert);
