@@ -7,6 +7,7 @@
 #include "Strings.h"
 #include "log.h"
 #include "Mutex.h"
+#include "Time.h"
 
 #define ENT(NAME) ent(TESSEL_FILE_BASENAME, __LINE__, NAME)
 #define RET(...) ret(TESSEL_FILE_BASENAME, __LINE__, __VA_ARGS__)
@@ -1319,15 +1320,31 @@ CMPIStatus CMPI_Adapter::referenceNames(CMPIAssociationMI* mi, const CMPIContext
 
 // Called by the provider's handler, on the provider's thread, whose
 // context (inherited from the enabling request) reaches the server.
+//
+// disableIndications holds the lock for its whole run while the provider
+// waits there for this very thread to end, so a delivery must not simply
+// block on the lock: it waits for it only while indications stay enabled,
+// and gives up (false, nothing sent) once a disable has begun. The
+// provider still holds what it handed over a copy of, and keeps it.
+// indications_enabled is read here without the lock, hence the atomics
+// wherever it changes.
 static bool _indication_proc(Instance* instance, void* client_data)
 {
     CMPI_Adapter* adapter = (CMPI_Adapter*)client_data;
-    Auto_Mutex auto_lock(adapter->lock);
+    Ref<Instance> hold(instance);
+
+    while (adapter->lock.try_lock() != 0)
+    {
+        if (!__atomic_load_n(&adapter->indications_enabled, __ATOMIC_ACQUIRE))
+            return false;
+        Time::sleep(Time::MSEC);
+    }
+
+    struct Held { Mutex& m; ~Held() { m.unlock(); } } held = { adapter->lock };
 
     if (!instance)
         return false;
 
-    Ref<Instance> hold(instance);
     CMPI_Thread_Context* top = static_cast<CMPI_Thread_Context*>(Thread_Context::top());
 
     if (!top || !top->broker || !top->context)
@@ -1433,7 +1450,7 @@ CMPIStatus CMPI_Adapter::enableIndications(CMPIIndicationMI* mi, const CMPIConte
         return _status(CMPI_RC_OK);
     }
 
-    adapter->indications_enabled = true;
+    __atomic_store_n(&adapter->indications_enabled, true, __ATOMIC_RELEASE);
     sint32 status = adapter->call(OP_ENABLE_INDICATIONS, (void*)_indication_proc, adapter);
 
     if (status == ENABLE_INDICATIONS_FAILED)
@@ -1458,13 +1475,12 @@ CMPIStatus CMPI_Adapter::disableIndications(CMPIIndicationMI* mi, const CMPICont
     if (!adapter->indications_enabled)
         return _status(CMPI_RC_OK);
 
-    adapter->indications_enabled = false;
-
-    // The provider waits here for its thread, whose delivery in flight
-    // needs the lock: it is let go for the call.
-    adapter->lock.unlock();
+    // Cleared before the provider waits for its thread, so that a delivery
+    // of that thread gives up rather than wait for our lock. The lock stays
+    // held: letting it go here would let an enableIndications in, which
+    // would reach the provider while it is still stopping.
+    __atomic_store_n(&adapter->indications_enabled, false, __ATOMIC_RELEASE);
     sint32 status = adapter->call(OP_DISABLE_INDICATIONS);
-    adapter->lock.lock();
 
     if (status == DISABLE_INDICATIONS_FAILED)
     {

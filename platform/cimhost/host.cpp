@@ -1722,6 +1722,13 @@ int Host_Impl::cleanup(bool terminating)
         }
         std::lock_guard<std::recursive_mutex> g(mi_mutex);
         slot_of(*t.first, t.second) = nullptr;
+        // An unloaded provider's filters went with it: a later subscription
+        // activates and enables a new one afresh.
+        if (t.second == MI_INDICATION)
+        {
+            t.first->filters = 0;
+            t.first->enabled = false;
+        }
     }
     return refused;
 }

@@ -3,6 +3,8 @@
 
 #include <algorithm>
 #include <chrono>
+#include <csignal>
+#include <ctime>
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
@@ -66,7 +68,9 @@ const char usage_text[] =
     "      cimhost cm 'root/vespera:VESPERA_AgentService.Name=\"a\"' executeMethod "
     "'request=string:{\"method\":\"discovery.getAdapters\",\"id\":1}'\n"
     "      cimhost cm PATH RequestStateChange 'Job=ref:root/vespera:VESPERA_ConcreteJob.InstanceID=\"j1\"'\n"
-    "  listen NS:CLASS       subscribe to indications and print each as it arrives\n"
+    "  listen NS:CLASS       subscribe to indications and print each as it arrives, an\n"
+    "                        alert with a summary line first; --json streams them as\n"
+    "                        the elements of one document\n"
     "      cimhost listen root/vespera:VESPERA_AlertIndication --seconds 30\n"
     "  session               read verbs from standard input, one a line, and answer\n"
     "                        each as the single command would, all in one process: a\n"
@@ -96,8 +100,10 @@ const char usage_text[] =
     "  --role NAME           the source object's role (ai, an, ri, rn)\n"
     "  --result-role NAME    the other end's role (ai, an)\n"
     "      cimhost an --role Dependent --result-role Antecedent PATH\n"
-    "  --seconds N           how long listen waits (default 10)\n"
+    "  --seconds N           how long listen waits (default 10; 0: until interrupted)\n"
     "      cimhost listen root/vespera:VESPERA_AlertIndication --seconds 5\n"
+    "  --count N             listen stops after N indications\n"
+    "      cimhost listen root/vespera:VESPERA_AlertIndication --seconds 0 --count 3\n"
     "  --no-interop          don't serve the interop namespace from the built-in object manager\n"
     "      cimhost --no-interop ei root/vespera:VESPERA_ObjectManager\n"
     "  --interop-namespace NS  the interop namespace (default root/PG_InterOp, as\n"
@@ -196,6 +202,7 @@ struct Args
     std::vector<std::string> props;
     std::string assoc_class, result_class, role, result_role;
     int seconds = 10;
+    long count = 0;
 };
 
 std::vector<std::string> split_list(const std::string& s)
@@ -223,7 +230,7 @@ Args read_args(const std::vector<std::string>& argv)
     Args a;
     static const char* const valued[] = {"--module", "--reg", "--props", "--assoc-class",
                                          "--result-class", "--role", "--result-role", "--seconds",
-                                         "--interop-namespace"};
+                                         "--interop-namespace", "--count"};
     const size_t argc = argv.size();
     for (size_t i = 0; i < argc; i++)
     {
@@ -266,6 +273,14 @@ Args read_args(const std::vector<std::string>& argv)
                 a.result_role = val;
             else if (opt == "--interop-namespace")
                 a.interop_namespace = val;
+            else if (opt == "--count")
+            {
+                char* end = nullptr;
+                long n = strtol(val.c_str(), &end, 10);
+                if (val.empty() || *end || n < 1 || n > 1000000000)
+                    bad("--count needs a number of indications, not '" + val + "'");
+                a.count = n;
+            }
             else
             {
                 char* end = nullptr;
@@ -373,6 +388,57 @@ Json::Value json_result(const Result& r, const std::string& verb)
     return j;
 }
 
+volatile sig_atomic_t interrupted = 0;
+
+void on_interrupt(int)
+{
+    interrupted = 1;
+}
+
+// CIM_Indication's PerceivedSeverity values.
+const char* severity_name(const Value* v)
+{
+    static const char* const names[] = {"Unknown", "Other", "Information", "Degraded/Warning",
+                                        "Minor", "Major", "Critical", "Fatal/NonRecoverable"};
+    if (!v || v->null || v->type != CMPI_uint16)
+        return "no severity";
+    return v->num.uint16 < sizeof(names) / sizeof(names[0]) ? names[v->num.uint16] : "DMTF Reserved";
+}
+
+std::string local_time_now()
+{
+    char text[32];
+    time_t t = time(nullptr);
+    struct tm tm;
+    localtime_r(&t, &tm);
+    strftime(text, sizeof(text), "%Y-%m-%d %H:%M:%S", &tm);
+    return text;
+}
+
+// One indication as it arrives: where and when, for an alert what it says
+// in one line, then all its properties.
+void print_indication(const Host& host, const Indication_Record& rec, size_t number)
+{
+    const Instance& inst = rec.instance;
+    std::cout << "// indication " << number << " in " << rec.name_space << " at "
+              << local_time_now() << "\n";
+    if (host.class_is_a(inst.class_name, "CIM_AlertIndication"))
+    {
+        std::string id = inst.get_text("MessageID");
+        std::string element = inst.get_text("AlertingManagedElement");
+        std::cout << "// alert " << inst.get_text("SequenceNumber") << ": "
+                  << severity_name(inst.get("PerceivedSeverity"))
+                  << (id.empty() ? "" : ", " + id) << ": " << inst.get_text("Message") << "\n";
+        if (!element.empty() && element != "NULL")
+            std::cout << "// at " << element << "\n";
+    }
+    std::cout << instance_mof(inst) << ";\n\n" << std::flush;
+}
+
+// Prints indications as they arrive until the time is up, the count is
+// reached or the user interrupts; with --json they are the elements of one
+// document, written as they come, so that the output is both a stream and
+// valid JSON once complete.
 int listen(Host& host, const Args& a)
 {
     if (a.positional.size() != 1)
@@ -388,39 +454,56 @@ int listen(Host& host, const Args& a)
             host.unsubscribe(id);
         return 1;
     }
-    if (!a.json)
-        std::cout << "listening for " << cls.class_name << " in " << cls.name_space << " for "
-                  << a.seconds << " s\n"
-                  << std::flush;
+
+    struct sigaction sa;
+    memset(&sa, 0, sizeof(sa));
+    sa.sa_handler = on_interrupt;
+    sigaction(SIGINT, &sa, nullptr);
+    sigaction(SIGTERM, &sa, nullptr);
+
+    if (a.json)
+        std::cout << "{\n\"operation\": \"listen\",\n\"indications\": [\n" << std::flush;
+    else
+        std::cout << "listening for " << cls.class_name << " in " << cls.name_space
+                  << (a.seconds ? " for " + std::to_string(a.seconds) + " s" : " until interrupted")
+                  << (a.count ? ", at most " + std::to_string(a.count) + " indications" : "")
+                  << "\n" << std::flush;
+
     auto end = std::chrono::steady_clock::now() + std::chrono::seconds(a.seconds);
     size_t shown = 0;
-    while (std::chrono::steady_clock::now() < end)
+    for (;;)
     {
         host.wait_indications(shown + 1, 200);
         std::vector<Indication_Record> inds = host.indications();
-        for (; shown < inds.size() && !a.json; shown++)
-            std::cout << "// indication in " << inds[shown].name_space << "\n"
-                      << instance_mof(inds[shown].instance) << ";\n\n"
-                      << std::flush;
+        for (; shown < inds.size() && (!a.count || long(shown) < a.count); shown++)
+        {
+            if (!a.json)
+            {
+                print_indication(host, inds[shown], shown + 1);
+                continue;
+            }
+            Json::Value e(Json::objectValue);
+            e["namespace"] = inds[shown].name_space;
+            e["instance"] = json_of(inds[shown].instance);
+            std::cout << (shown ? ",\n" : "") << Json::StyledWriter().write(e) << std::flush;
+        }
+        if (interrupted || (a.count && long(shown) >= a.count) ||
+            (a.seconds && std::chrono::steady_clock::now() >= end))
+            break;
     }
+
     Result u = host.unsubscribe(id);
     if (a.json)
     {
-        Json::Value j(Json::objectValue);
-        j["operation"] = "listen";
-        j["rc"] = int(u.rc);
-        j["rc_name"] = rc_name(u.rc);
-        j["message"] = u.message;
-        Json::Value list(Json::arrayValue);
-        for (const Indication_Record& rec : host.indications())
-        {
-            Json::Value e(Json::objectValue);
-            e["namespace"] = rec.name_space;
-            e["instance"] = json_of(rec.instance);
-            list.append(e);
-        }
-        j["indications"] = list;
-        std::cout << Json::StyledWriter().write(j);
+        Json::Value tail(Json::objectValue);
+        tail["rc"] = int(u.rc);
+        tail["rc_name"] = rc_name(u.rc);
+        tail["message"] = u.message;
+        std::string rest = Json::StyledWriter().write(tail);
+        // The members of the tail, after the list: without its own braces.
+        rest = rest.substr(rest.find('{') + 1);
+        rest = rest.substr(0, rest.rfind('}'));
+        std::cout << "],\n" << rest << "}\n" << std::flush;
     }
     if (!u.ok())
     {

@@ -449,6 +449,7 @@ DTRUJ_API void registerEventProcessingCb(EventProcessCB cb)
     Json::Value dummy;
     applyFault("registerEventProcessingCb", dummy);
     eventCallback().store(cb);
+    notifyEvents(state());
 }
 
 DTRUJ_API Json::Value init_hba_lib(const Json::Value& req)
@@ -663,9 +664,7 @@ JSON_ENTRY(setAdapterState)
     bool on = req["enableState"].asBool();
     if ((*a)["hbaData"]["hbaStatus"].asBool() != on) {
         (*a)["hbaData"]["hbaStatus"] = on;
-        for (const Json::Value& p : (*a)["fcPorts"])
-            portEvent(s, 2, on ? 7 : 8, p["wwn"].asString(), on ? "TRU_PORT_ENABLE" : "TRU_PORT_DISABLE",
-                      on ? 1 : 2, on ? "Port enabled" : "Port disabled");
+        adapterStateEvents(s, *a, on);
     }
     SIMLOG(SL_INFO, "adapter %s %s", addr.c_str(), on ? "enabled" : "disabled");
     return okReply(on ? "Adapter enabled" : "Adapter disabled");
@@ -948,16 +947,9 @@ JSON_ENTRY(setPortByWwn)
     std::string err;
     if (!applyProps(*port, p.fc ? "fcPort" : "ethPort", req["port"], names, changed, err))
         return errorReply(3, err);
-    if (contains(changed, "portStatus")) {
-        bool on = (*port)["portStatus"].asBool();
-        appendPortLog(*port, on ? "Port enabled" : "Port disabled");
-        if (p.fc)
-            portEvent(s, 2, on ? 7 : 8, (*port)["wwn"].asString(), on ? "TRU_PORT_ENABLE" : "TRU_PORT_DISABLE",
-                      on ? 1 : 2, on ? "Base port enabled" : "Base port disabled");
-        else
-            portEvent(s, 10, on ? 3 : 4, (*port)["mac"].asString(), on ? "TRU_ETH_ENABLE" : "TRU_ETH_DISABLE",
-                      on ? 1 : 3, on ? "Ethernet port enabled" : "Ethernet port disabled");
-    }
+    if (contains(changed, "portStatus"))
+        appendPortLog(*port, (*port)["portStatus"].asBool() ? "Port enabled" : "Port disabled");
+    portChangeEvents(s, *port, p.fc != nullptr, changed);
     SIMLOG(SL_INFO, "port %s: %zu propert(ies) changed", p.addr.c_str(), changed.size());
     return okReply("Port updated");
 }
@@ -1156,8 +1148,7 @@ JSON_ENTRY(setPortAuthentication)
         auth[m] = a[m];
     bool is = auth["authEnabled"].asBool();
     if (was != is)
-        portEvent(s, 8, is ? 1 : 2, (*p.fc)["wwn"].asString(), is ? "TRU_AUDIT_AUTH_ENABLE" : "TRU_AUDIT_AUTH_DISABLE",
-                  1, is ? "Authentication enabled" : "Authentication disabled");
+        authEvent(s, *p.fc, is);
     return okReply("Port authentication set");
 }
 
@@ -1173,7 +1164,7 @@ JSON_ENTRY(resetPortAuthentication)
     auth["algorithm"] = "MD5";
     auth["hashGroup"] = "DH-NULL";
     if (was)
-        portEvent(s, 8, 2, (*p.fc)["wwn"].asString(), "TRU_AUDIT_AUTH_DISABLE", 1, "Authentication disabled");
+        authEvent(s, *p.fc, false);
     return okReply("Port authentication reset");
 }
 
@@ -1555,11 +1546,7 @@ JSON_ENTRY(setEthPort)
         return errorReply(3, "mtu out of range 576..9600");
     if (!applyProps(*p.eth, "ethPort", v, req["propArray"], changed, err))
         return errorReply(3, err);
-    if (contains(changed, "portStatus")) {
-        bool on = (*p.eth)["portStatus"].asBool();
-        portEvent(s, 10, on ? 3 : 4, (*p.eth)["mac"].asString(), on ? "TRU_ETH_ENABLE" : "TRU_ETH_DISABLE",
-                  on ? 1 : 3, on ? "Ethernet port enabled" : "Ethernet port disabled");
-    }
+    portChangeEvents(s, *p.eth, false, changed);
     return okReply("Ethernet port updated");
 }
 
@@ -2045,20 +2032,6 @@ DTRUJ_API Json::Value diagMemoryTest(const Json::Value& req)
 }
 
 // ---------------------------------------------------------------- simulator controls
-
-// Delivers one event text on the event thread; -1 if nobody registered.
-DTRUJ_API int dtruj_sim_inject_event(const char* json)
-{
-    if (!json)
-        return -1;
-    State& s = state();
-    std::lock_guard<std::mutex> g(s.evMtx);
-    if (!s.evRegistered)
-        return -1;
-    s.evQueue.push_back(json);
-    s.evCv.notify_one();
-    return 0;
-}
 
 // Sets the fault of one entry: a kind ("null", "error", "hba", "std",
 // "unknown", "delay:<ms>"), a JSON object text with "kind", "code",

@@ -1,20 +1,15 @@
 // The simulated host: loading its description, looking things up in it,
-// counters, events and faults.
+// counters and faults. The events are in Events.cpp.
 #include "Sim.h"
 
 #include <cerrno>
-#include <chrono>
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
-#include <fcntl.h>
 #include <fstream>
-#include <poll.h>
 #include <sstream>
 #include <strings.h>
-#include <sys/stat.h>
 #include <sys/time.h>
-#include <unistd.h>
 
 namespace OLMA {
 namespace Sim {
@@ -662,172 +657,6 @@ Json::Value counters(State& s, const std::string& key, const char* const* names)
 void resetCounters(State& s, const std::string& keyPrefix)
 {
     s.resets[keyPrefix] = now();
-}
-
-// ---------------------------------------------------------------- events
-
-void queueEvent(State& s, const std::string& json)
-{
-    std::lock_guard<std::mutex> g(s.evMtx);
-    if (!s.evRegistered)
-        return;
-    s.evQueue.push_back(json);
-    s.evCv.notify_one();
-}
-
-void portEvent(State& s, int category, int id, const std::string& portAddr,
-               const char* idValue, int severity, const char* msg)
-{
-    Json::Value e(Json::objectValue);
-    e["eventCategory"] = category;
-    e["eventId"] = id;
-    e["portIndexString"] = plainAddr(portAddr);
-    e["basePortWWN"] = portAddr;
-    e["eventIdValue"] = idValue;
-    e["eventSeverity"] = severity;
-    e["eventMsg"] = msg;
-    e["timeStamp"] = Json::UInt64(now());
-    Json::FastWriter w;
-    std::string text = w.write(e);
-    if (!text.empty() && text.back() == '\n')
-        text.pop_back();
-    queueEvent(s, text);
-}
-
-// Lines written by a user to the file or FIFO named by DTRUJ_EVENTS. A FIFO
-// is also opened for writing by us, so that it never reads as ended while no
-// writer is connected.
-struct EventSource {
-    int fd = -1;
-    int keepWriter = -1;
-    bool fifo = false;
-    std::string partial;
-
-    void open(const char* path, off_t offset)
-    {
-        struct stat st;
-        if (stat(path, &st) != 0)
-            return;
-        fifo = S_ISFIFO(st.st_mode);
-        fd = ::open(path, O_RDONLY | O_NONBLOCK | O_CLOEXEC);
-        if (fd < 0)
-            return;
-        if (fifo)
-            keepWriter = ::open(path, O_WRONLY | O_NONBLOCK | O_CLOEXEC);
-        else
-            lseek(fd, offset, SEEK_SET);
-    }
-    void close()
-    {
-        if (fd >= 0)
-            ::close(fd);
-        if (keepWriter >= 0)
-            ::close(keepWriter);
-        fd = keepWriter = -1;
-    }
-    // Reads what is there, returns complete lines.
-    void readLines(std::vector<std::string>& lines, off_t& offset)
-    {
-        if (fd < 0)
-            return;
-        if (fifo) {
-            struct pollfd p = {fd, POLLIN, 0};
-            if (poll(&p, 1, 0) <= 0 || !(p.revents & POLLIN))
-                return;
-        }
-        char buf[4096];
-        ssize_t n;
-        while ((n = ::read(fd, buf, sizeof(buf))) > 0) {
-            if (!fifo)
-                offset += n;
-            partial.append(buf, size_t(n));
-        }
-        size_t pos;
-        while ((pos = partial.find('\n')) != std::string::npos) {
-            std::string line = partial.substr(0, pos);
-            partial.erase(0, pos + 1);
-            if (!line.empty() && line.back() == '\r')
-                line.pop_back();
-            if (line.find_first_not_of(" \t") != std::string::npos)
-                lines.push_back(line);
-        }
-    }
-};
-
-static void eventThread(State* s, std::string path, unsigned generation)
-{
-    EventSource src;
-    off_t offset;
-    {
-        std::lock_guard<std::mutex> g(s->evMtx);
-        offset = s->evFileOffset;
-    }
-    if (!path.empty())
-        src.open(path.c_str(), offset);
-    for (;;) {
-        std::vector<std::string> lines;
-        src.readLines(lines, offset);
-        std::deque<std::string> batch;
-        {
-            std::unique_lock<std::mutex> g(s->evMtx);
-            if (s->evGeneration != generation)
-                break;
-            s->evFileOffset = offset;
-            for (auto& l : lines)
-                s->evQueue.push_back(l);
-            if (s->evQueue.empty() && !s->evStop)
-                s->evCv.wait_for(g, std::chrono::milliseconds(50));
-            if (s->evStop || s->evGeneration != generation)
-                break;
-            batch.swap(s->evQueue);
-        }
-        // The callback runs without our locks: the module may call back
-        // into the library from it.
-        for (const std::string& e : batch) {
-            EventProcessCB cb = eventCallback().load();
-            if (cb)
-                cb(e.c_str());
-        }
-    }
-    src.close();
-}
-
-bool startEvents(State& s, bool dropOld)
-{
-    std::lock_guard<std::mutex> g(s.evMtx);
-    if (dropOld)
-        s.evQueue.clear();
-    if (s.evRegistered)
-        return true;
-    s.evRegistered = true;
-    s.evStop = false;
-    ++s.evGeneration;
-    const char* path = getenv("DTRUJ_EVENTS");
-    s.evThread = std::thread(eventThread, &s, std::string(path ? path : ""), s.evGeneration);
-    return true;
-}
-
-void stopEvents(State& s)
-{
-    std::thread t;
-    {
-        std::lock_guard<std::mutex> g(s.evMtx);
-        if (!s.evRegistered)
-            return;
-        s.evRegistered = false;
-        s.evStop = true;
-        s.evQueue.clear();
-        s.evCv.notify_all();
-        t.swap(s.evThread);
-    }
-    if (!t.joinable())
-        return;
-    // Called from the event callback itself: the thread can't join itself,
-    // so it is let go and ends at its next look at the stop flag.
-    if (t.get_id() == std::this_thread::get_id())
-        t.detach();
-    else
-        t.join();
 }
 
 // ---------------------------------------------------------------- faults

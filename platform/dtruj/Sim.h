@@ -95,6 +95,7 @@ struct State {
     unsigned evGeneration = 0;      // a thread let go by stopEvents ends when this moves on
     std::thread evThread;
     off_t evFileOffset = 0;
+    std::atomic<unsigned long> evDelivered{0};  // texts handed to a callback
 };
 
 State& state();
@@ -173,6 +174,16 @@ void portEvent(State& s, int category, int id, const std::string& portAddr,
                const char* idValue, int severity, const char* msg);
 bool startEvents(State& s, bool dropOld);
 void stopEvents(State& s);
+// Wakes the event thread, for events that waited for a callback.
+void notifyEvents(State& s);
+// The events that a change of the host raises, as the adapter would:
+// enabling or disabling an adapter (its ports that are enabled themselves),
+// the members "portStatus" and "linkUp" that a setter changed on a port,
+// and a port's authentication going on or off.
+void adapterStateEvents(State& s, const Json::Value& adapter, bool on);
+void portChangeEvents(State& s, const Json::Value& port, bool fc,
+                      const std::vector<std::string>& changed);
+void authEvent(State& s, const Json::Value& port, bool on);
 
 // The call log (Calls.cpp): every JSON entry records its request.
 void recordCall(const char* entry, const Json::Value& req);

@@ -30,7 +30,7 @@ TEST_F(Indication, EachAlertReachesEveryNamespaceWithAFilter)
     ASSERT_TRUE(host->subscribe("root/other", "TST_Alert", c).ok());
     EXPECT_EQ(1u, state->enables);
 
-    state->pending = 2;
+    __atomic_store_n(&state->pending, 2u, __ATOMIC_RELEASE);
     EXPECT_EQ(4u, host->wait_indications(4, 5000));
     EXPECT_EQ(2u, delivered_in("root/test"));
     EXPECT_EQ(2u, delivered_in("root/other"));
@@ -44,7 +44,7 @@ TEST_F(Indication, EachAlertReachesEveryNamespaceWithAFilter)
     host->clear_indications();
     ASSERT_TRUE(host->unsubscribe(a).ok());
     ASSERT_TRUE(host->unsubscribe(c).ok());
-    state->pending = 1;
+    __atomic_store_n(&state->pending, 1u, __ATOMIC_RELEASE);
     EXPECT_EQ(1u, host->wait_indications(1, 5000));
     Time::sleep(50 * Time::MSEC);
     EXPECT_EQ(1u, delivered_in("root/test"));
@@ -55,6 +55,31 @@ TEST_F(Indication, EachAlertReachesEveryNamespaceWithAFilter)
     ASSERT_TRUE(host->unsubscribe(b).ok());
     EXPECT_EQ(1u, state->disables);
     EXPECT_TRUE(state->stream_ended);
+}
+
+// The last unsubscription disables the provider while its thread is in
+// the middle of a delivery, which needs the adapter's lock that the disable
+// holds: the delivery gives up rather than wait, and the disable ends.
+TEST_F(Indication, DisableDoesNotWaitForADeliveryInFlight)
+{
+    // A disable catches the thread inside a delivery more often than not;
+    // at least twenty cycles, and on until one has.
+    unsigned refused = 0;
+    for (int cycle = 0; cycle < 20 || (refused == 0 && cycle < 500); cycle++)
+    {
+        int a = 0;
+        ASSERT_TRUE(host->subscribe("root/test", "TST_Alert", a).ok());
+        size_t before = host->indications().size();
+        state->stream_ended = false;
+        __atomic_store_n(&state->pending, 1000000u, __ATOMIC_RELEASE);
+        ASSERT_GE(host->wait_indications(before + 10, 5000), before + 10);
+        ASSERT_TRUE(host->unsubscribe(a).ok()) << cycle;
+        EXPECT_TRUE(state->stream_ended);
+        refused += state->refused;
+        state->refused = 0;
+        __atomic_store_n(&state->pending, 0u, __ATOMIC_RELEASE);
+    }
+    EXPECT_GT(refused, 0u) << "no delivery was caught by a disable";
 }
 
 TEST_F(Indication, FailedEnableIsNotRetried)

@@ -2,6 +2,7 @@
 // choose, registered and exported as the generated glue does for the real
 // providers, and linked the same way.
 
+#include <atomic>
 #include <cstdio>
 #include <cstring>
 #include "tst_classes.h"
@@ -289,7 +290,7 @@ public:
 };
 
 // Sends TST_Alert from a thread of its own while enabled: as many as the
-// tests ask for through pending.
+// tests ask for through pending, which both sides touch atomically.
 class TST_Alert_Provider
 {
 public:
@@ -341,16 +342,17 @@ private:
 
         while (!self->_stop)
         {
-            if (_state.pending)
+            if (__atomic_load_n(&_state.pending, __ATOMIC_ACQUIRE))
             {
-                _state.pending--;
+                __atomic_fetch_sub(&_state.pending, 1, __ATOMIC_ACQ_REL);
                 TST_Alert* alert = create<TST_Alert>(false);
                 alert->Message.set("alert");
                 alert->Sequence.set(++_state.alerts_sent);
                 String args[] = { String("port"), String("down") };
                 alert->Args.set(Array<String>(args, 2));
                 alert->When.set(Datetime("20240102030405.000006+060"));
-                self->_handler->handle(alert);
+                if (!self->_handler->handle(alert))
+                    _state.refused++;
             }
             else
                 Time::sleep(Time::MSEC);
@@ -361,7 +363,7 @@ private:
 
     Indication_Handler<TST_Alert>* _handler;
     Thread _thread;
-    volatile bool _stop;
+    std::atomic<bool> _stop;
 };
 
 extern "C" sint32 __tessel_TST_Alert_Provider_proc(

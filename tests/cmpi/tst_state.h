@@ -35,6 +35,7 @@ struct Tst_State
     unsigned enables;
     unsigned disables;
     unsigned alerts_sent;
+    unsigned refused;       // alerts that the handler didn't take
     bool stream_ended;
 
     // Life cycle.

@@ -79,6 +79,24 @@ struct Lib {
         auto f = sym<int (*)(const char*)>("dtruj_sim_inject_event");
         return f ? f(json) : -2;
     }
+
+    int injectCopies(const char* json, int count)
+    {
+        auto f = sym<int (*)(const char*, int)>("dtruj_sim_inject_copies");
+        return f ? f(json, count) : -2;
+    }
+
+    int injectList(const char* jsonArray)
+    {
+        auto f = sym<int (*)(const char*)>("dtruj_sim_inject_list");
+        return f ? f(jsonArray) : -2;
+    }
+
+    unsigned long eventsDelivered()
+    {
+        auto f = sym<unsigned long (*)()>("dtruj_sim_events_delivered");
+        return f ? f() : 0;
+    }
 };
 
 inline Json::Value obj(std::initializer_list<std::pair<const char*, Json::Value>> members)

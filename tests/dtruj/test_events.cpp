@@ -104,6 +104,76 @@ TEST_F(DtrujEvents, StateChangesRaiseTheirEvents)
     EXPECT_EQ("00051e8b2002", eth["portIndexString"].asString());
 }
 
+TEST_F(DtrujEvents, BurstsArriveBackToBackInOrder)
+{
+    EXPECT_EQ(-1, lib.injectCopies("{}", 3));   // nobody listens yet
+    subscribe();
+    unsigned long before = lib.eventsDelivered();
+    EXPECT_EQ(200, lib.injectCopies("{\"eventCategory\":2,\"eventId\":1}", 200));
+    // Strings go as they are, anything else as compact JSON.
+    EXPECT_EQ(3, lib.injectList("[{\"eventCategory\": 8, \"eventId\": 2}, \"{broken\", 7]"));
+    EXPECT_EQ(-1, lib.injectList("{\"eventCategory\":2}"));
+    EXPECT_EQ(-1, lib.injectList("[unterminated"));
+    ASSERT_EQ(203u, waitFor(203));
+    EXPECT_EQ(before + 203, lib.eventsDelivered());
+    std::lock_guard<std::mutex> g(gMtx);
+    EXPECT_EQ("{\"eventCategory\":2,\"eventId\":1}", gEvents[199]);
+    EXPECT_EQ("{\"eventCategory\":8,\"eventId\":2}", gEvents[200]);
+    EXPECT_EQ("{broken", gEvents[201]);
+    EXPECT_EQ("7", gEvents[202]);
+}
+
+TEST_F(DtrujEvents, AdapterAndLinkChangesRaiseWhatTheAdapterWould)
+{
+    subscribe();
+    Json::Value off = obj({{"portStatus", false}});
+    lib.call("setPortByWwn", obj({{"indexStr", FCOE_PORT}, {"port", off},
+                                  {"propArray", strArray({"portStatus"})}}));
+    ASSERT_EQ(1u, waitFor(1));
+    // The port that is off already raises nothing with its adapter; the
+    // Ethernet port goes off with it.
+    lib.call("setAdapterState", obj({{"indexStr", CNA}, {"enableState", false}}));
+    lib.call("setPortByWwn", obj({{"indexStr", FC_PORT0}, {"port", obj({{"linkUp", false}})},
+                                  {"propArray", strArray({"linkUp"})}}));
+    lib.call("setEthPort", obj({{"mac", ETH_PORT}, {"ethPort", obj({{"linkUp", true}})},
+                                {"propArray", strArray({"linkUp"})}}));   // no change, no event
+    lib.call("setEthPort", obj({{"mac", ETH_PORT}, {"ethPort", obj({{"linkUp", false}})},
+                                {"propArray", strArray({"linkUp"})}}));
+    ASSERT_EQ(4u, waitFor(4));
+    usleep(100000);
+    std::vector<std::string> seen;
+    {
+        std::lock_guard<std::mutex> g(gMtx);
+        ASSERT_EQ(4u, gEvents.size());
+        for (const std::string& text : gEvents) {
+            Json::Value e;
+            Json::Reader().parse(text, e);
+            seen.push_back(std::to_string(e["eventCategory"].asInt()) + "/" +
+                           std::to_string(e["eventId"].asInt()) + " " +
+                           e["basePortWWN"].asString() + " " +
+                           std::to_string(e["eventSeverity"].asInt()));
+        }
+    }
+    EXPECT_EQ((std::vector<std::string>{
+                  std::string("2/8 ") + FCOE_PORT + " 3",
+                  std::string("10/4 ") + ETH_PORT + " 3",
+                  std::string("2/11 ") + FC_PORT0 + " 2",
+                  std::string("10/2 ") + ETH_PORT + " 2"}),
+              seen);
+}
+
+TEST_F(DtrujEvents, EventsWaitForACallback)
+{
+    // Registered for events, but no callback yet, as a caller has it for a
+    // moment between the two calls.
+    ASSERT_FALSE(isError(lib.call("register_for_events", obj({{"dropOldEvents", true}}))));
+    ASSERT_EQ(0, lib.inject("{\"eventCategory\":2,\"eventId\":1}"));
+    usleep(100000);
+    EXPECT_EQ(0u, waitFor(0, 0));
+    lib.sym<OLMA::evtProcessCBRetVoidFP>("registerEventProcessingCb")(onEvent);
+    EXPECT_EQ(1u, waitFor(1));
+}
+
 TEST_F(DtrujEvents, UnregisterStopsDelivery)
 {
     subscribe();
