@@ -86,12 +86,34 @@ bool isTapeLike(const char* type)
     return type && (strcmp(type, "Tape") == 0 || strcmp(type, "Media Changer") == 0);
 }
 
-bool serves(bool tapeLike, classId_t id)
+bool servesKind(bool tapeLike, classId_t id)
 {
     if (tapeLike)
         return id == ID_VESPERA_TapeDrive;
 
     return id == ID_VESPERA_StorageExtent || id == ID_VESPERA_LogicalDisk;
+}
+
+// Whether a remote port of this device data holds units of the class: a
+// target of the kind the class shows. Says why not, as the walk always has.
+bool serves(const Json::Value& device, classId_t id)
+{
+    if (!member(device, "isTarget").asBool())
+    {
+        TLOG(LL_DBG, "Nothing to do since the its not a Target Rport.");
+        return false;
+    }
+
+    const char* type = textOf(device, "type");
+    TLOG(LL_DBG, "Device type = %s", type ? type : "");
+
+    if (!servesKind(isTapeLike(type), id))
+    {
+        TLOG(LL_INFO, "Continue with next rport. Looking for another device type ");
+        return false;
+    }
+
+    return true;
 }
 
 String trimmed(char* text)
@@ -160,7 +182,21 @@ String serialName(_hbaLunInfo& lun)
 
 } // namespace
 
-Array<Instance*> TargetHelper::getTargetInstances(_hbaPortInfo port, classId_t id)
+const Json::Value* TargetHelper::listedDeviceData(const Json::Value& remotePort)
+{
+    const Json::Value& device = member(remotePort, "deviceData");
+
+    if (!device.isObject() || !device["isTarget"].isBool())
+        return 0;
+
+    if (device["isTarget"].asBool() && !device["type"].isString())
+        return 0;
+
+    return &device;
+}
+
+Array<Instance*> TargetHelper::getTargetInstances(_hbaPortInfo port, classId_t id,
+    const _keyLookup* lookup)
 {
     Array<Instance*> result;
 
@@ -184,8 +220,10 @@ Array<Instance*> TargetHelper::getTargetInstances(_hbaPortInfo port, classId_t i
 
     // Once one unit of this port lacks a description, the library's
     // descriptions of the port aren't trusted any more: every later unit is
-    // named by its serial number instead.
+    // named by its serial number instead. Only the logical disk doesn't
+    // show what the rule changes.
     bool serialRule = false;
+    bool ruleMatters = id != ID_VESPERA_LogicalDisk;
 
     for (Json::ArrayIndex r = 0; r < remotePorts.size(); r++)
     {
@@ -197,6 +235,25 @@ Array<Instance*> TargetHelper::getTargetInstances(_hbaPortInfo port, classId_t i
                 port.portWwn);
             continue;
         }
+
+        char plainRemote[sizeof(((_hbaLunInfo*)0)->rPortWwn)] = "";
+        copyField(plainRemote, sizeof(plainRemote),
+            ProviderUtil::eraseColonsFromIndex(String(remoteWwn)).c_str());
+
+        // A look-up reads another remote port only while its units can
+        // still change how the one looked for is named.
+        bool candidate = !lookup || lookup->isBehind(port.portWwn, plainRemote);
+
+        if (!candidate && (serialRule || !ruleMatters))
+            continue;
+
+        // The list answers whether a remote port serves this class where it
+        // carries the device data: then only the ports that do are read
+        // whole, with their logical units.
+        const Json::Value* listed = listedDeviceData(remotePorts[r]);
+
+        if (listed && !serves(*listed, id))
+            continue;
 
         request["rPortWwn"] = remoteWwn;
 
@@ -212,28 +269,15 @@ Array<Instance*> TargetHelper::getTargetInstances(_hbaPortInfo port, classId_t i
         }
 
         const Json::Value& device = member(reply, "deviceData");
-        const Json::Value& isTarget = member(device, "isTarget");
 
-        if (!isTarget.isBool())
+        if (!member(device, "isTarget").isBool())
         {
             TLOG(LL_ERR, "No device data for Rport %s.", remoteWwn);
             continue;
         }
 
-        if (!isTarget.asBool())
-        {
-            TLOG(LL_DBG, "Nothing to do since the its not a Target Rport.");
+        if (!serves(device, id))
             continue;
-        }
-
-        const char* type = textOf(device, "type");
-        TLOG(LL_DBG, "Device type = %s", type ? type : "");
-
-        if (!serves(isTapeLike(type), id))
-        {
-            TLOG(LL_INFO, "Continue with next rport. Looking for another device type ");
-            continue;
-        }
 
         const Json::Value& luns = member(reply, "lunList");
 
@@ -251,8 +295,7 @@ Array<Instance*> TargetHelper::getTargetInstances(_hbaPortInfo port, classId_t i
 
             _hbaLunInfo lun;
             memset(&lun, 0, sizeof(lun));
-            copyField(lun.rPortWwn, sizeof(lun.rPortWwn),
-                ProviderUtil::eraseColonsFromIndex(String(remoteWwn)).c_str());
+            memcpy(lun.rPortWwn, plainRemote, sizeof(lun.rPortWwn));
 
             const Json::Value& number = member(unit, "number");
             const char* vendor = textOf(unit, "vendor");
@@ -292,6 +335,9 @@ Array<Instance*> TargetHelper::getTargetInstances(_hbaPortInfo port, classId_t i
                     lun.idType = LUN_ID_NONE;
             }
 
+            if (!candidate || (lookup && !lookup->endsWith(unitName(lun).c_str())))
+                continue;
+
             Instance* instance = 0;
 
             if (id == ID_VESPERA_StorageExtent)
@@ -302,6 +348,9 @@ Array<Instance*> TargetHelper::getTargetInstances(_hbaPortInfo port, classId_t i
                 instance = getLogicalDiskInstance(port, lun);
 
             result.append(instance);
+
+            if (lookup && lookup->keepMatch(result, result.size() - 1))
+                return result;
         }
     }
 
