@@ -518,7 +518,16 @@ String ProviderUtil::getClassName(classId_t id)
         return String("INVALID CLASS");
     }
 
-    return String(classNames[id]);
+    // Built once: every instance of a walk names its class and the host's,
+    // and a copy of a built String only counts a reference.
+    static const String* names = [] {
+        static String all[MAXCLASSID + 1];
+        for (int i = 0; i <= MAXCLASSID; i++)
+            all[i] = String(classNames[i]);
+        return all;
+    }();
+
+    return names[id];
 }
 
 String ProviderUtil::getDiagTestName(diag_test_id_t id)

@@ -135,9 +135,13 @@ String unitName(const _hbaLunInfo& lun)
     return String(name);
 }
 
+const String describeStorageExtent("It is a unique identification for a Storage Extent");
+const String describeTapeDrive("It is a unique identification for a Tape Drive");
+const String describeLogicalDisk("It is a unique identification for a Logical Disk");
+
 // What the three classes share. The DeviceID ties a unit to its local and
 // remote port, which is how the paths of the host's view find it.
-void setCommon(CIM_LogicalDevice* p, classId_t id, const char* description,
+void setCommon(CIM_LogicalDevice* p, classId_t id, const String& description,
     _hbaPortInfo& port, _hbaLunInfo& lun)
 {
     ProviderUtil* util = ProviderUtil::getProviderUtil();
@@ -162,7 +166,7 @@ void setCommon(CIM_LogicalDevice* p, classId_t id, const char* description,
     p->OtherIdentifyingInfo.set(other);
 
     Array<String> descriptions;
-    descriptions.append(String(description));
+    descriptions.append(description);
     p->IdentifyingDescriptions.set(descriptions);
 
     Array<uint16> status;
@@ -362,7 +366,7 @@ Instance* TargetHelper::getStorageExtentInstance(_hbaPortInfo port, _hbaLunInfo 
     VESPERA_StorageExtent* p = create<VESPERA_StorageExtent>(true);
 
     setCommon(p, ID_VESPERA_StorageExtent,
-        "It is a unique identification for a Storage Extent", port, lun);
+        describeStorageExtent, port, lun);
 
     uint16 format = 0;
     uint16 space = 0;
@@ -413,7 +417,7 @@ Instance* TargetHelper::getTapeDriveInstance(_hbaPortInfo port, _hbaLunInfo lun)
     VESPERA_TapeDrive* p = create<VESPERA_TapeDrive>(true);
 
     setCommon(p, ID_VESPERA_TapeDrive,
-        "It is a unique identification for a Tape Drive", port, lun);
+        describeTapeDrive, port, lun);
 
     switch (lun.idType)
     {
@@ -443,7 +447,7 @@ Instance* TargetHelper::getLogicalDiskInstance(_hbaPortInfo port, _hbaLunInfo lu
     VESPERA_LogicalDisk* p = create<VESPERA_LogicalDisk>(true);
 
     setCommon(p, ID_VESPERA_LogicalDisk,
-        "It is a unique identification for a Logical Disk", port, lun);
+        describeLogicalDisk, port, lun);
 
     p->Name.set(lun.description);
     p->NameFormat.set(1);
