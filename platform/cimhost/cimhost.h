@@ -96,6 +96,7 @@ struct Value
     static Value of_datetime(const std::string& cim_text);
     static Value of_ref(const Object_Path& path);
     static Value of_instance(const Instance& inst);
+    static Value of_instance(Instance&& inst);
     static Value null_of(CMPIType type);
 };
 

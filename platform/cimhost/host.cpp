@@ -264,9 +264,11 @@ const char* kind_word(unsigned kind)
     }
 }
 
-void fill_from(std::vector<Value>& out, const Collector& c)
+void fill_from(std::vector<Value>& out, Collector& c)
 {
-    out.insert(out.end(), c.items.begin(), c.items.end());
+    out.insert(out.end(), std::make_move_iterator(c.items.begin()),
+               std::make_move_iterator(c.items.end()));
+    c.items.clear();
 }
 
 //
@@ -1797,14 +1799,26 @@ static Result not_loaded(const Host_Impl* h)
     return r;
 }
 
+// Hands what the providers returned to the caller: an instance or path that
+// nothing else shares moves, without a copy.
+template<class T>
+static void take(std::shared_ptr<T>& from, std::vector<T>& to)
+{
+    if (from.use_count() == 1)
+        to.push_back(std::move(*from));
+    else
+        to.push_back(*from);
+}
+
 static void split(std::vector<Value>& items, Result& r)
 {
+    r.instances.reserve(items.size());
     for (Value& v : items)
     {
         if (v.type == CMPI_instance && v.inst)
-            r.instances.push_back(*v.inst);
+            take(v.inst, r.instances);
         else if (v.type == CMPI_ref && v.ref)
-            r.paths.push_back(*v.ref);
+            take(v.ref, r.paths);
     }
 }
 
@@ -1849,7 +1863,7 @@ Result Host::gi(const Object_Path& path, const std::vector<std::string>* props)
         r.rc = impl->do_get(path, pl.get(props), v, r.message);
     }
     if (r.rc == CMPI_RC_OK && v.inst)
-        r.instances.push_back(*v.inst);
+        take(v.inst, r.instances);
     return r;
 }
 
