@@ -310,7 +310,11 @@ class Register(unittest.TestCase):
         p = self.run_script("pegasus", ok=False)
         self.assertIn("failed: cimmof -uc -aEV -n root/vespera", p.stderr)
         self.assertEqual(1, sum(c.startswith("cimmof") for c in self.calls()))
-        self.assertFalse(os.path.exists(self.path("state", "pegasus.state")))
+        # What was done before the failure is noted, and taken back.
+        self.assertEqual(2, len(self.links()))
+        del self.env["STUB_FAIL_cimmof"]
+        self.run_script("pegasus", "--uninstall")
+        self.assertEqual([], self.links())
 
     def test_usage(self):
         self.assertEqual(2, subprocess.run(["sh", SCRIPT], env=self.env,
