@@ -112,15 +112,6 @@ TEST_F(Interop, WhereSMISDiscoveryStarts)
     }
 }
 
-TEST_F(Interop, InventoryAndObjectManagerStayInTheModulesNamespace)
-{
-    for (const char* name : { "VESPERA_FCPort", "VESPERA_ComputerSystem", "VESPERA_ObjectManager" })
-    {
-        EXPECT_EQ(CMPI_RC_ERR_INVALID_NAMESPACE, host->ei(cls("root/interop", name)).rc) << name;
-        EXPECT_EQ(CMPI_RC_OK, host->ei(cls("root/vespera", name)).rc) << name;
-    }
-}
-
 // SFCB keeps its own object manager in root/interop, the namespace where the
 // module's profile classes are registered too. Both answer there, and the
 // module still learns the server's name.
