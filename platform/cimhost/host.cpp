@@ -184,9 +184,12 @@ public:
         return false;
     }
 
+    // Whether the stand-in object manager answers in ns. A module may serve
+    // classes of its own there too, as it would in a real server's interop
+    // namespace; both then answer.
     bool is_interop(const std::string& ns) const
     {
-        return name_eq(ns, opts.interop_namespace) && !known_ns(ns);
+        return opts.interop && name_eq(ns, opts.interop_namespace);
     }
 
     void* mi_for(const std::string& provider, unsigned kind, const std::string& ns, CMPIrc& rc,
@@ -1227,7 +1230,11 @@ CMPIrc Host_Impl::do_enum(Object_Path cls, const char** props, bool names,
     if (rc != CMPI_RC_OK)
         return rc;
     if (is_interop(cls.name_space))
-        return interop_enum(cls, names, out);
+    {
+        interop_enum(cls, names, out);
+        if (!known_ns(cls.name_space))
+            return CMPI_RC_OK;
+    }
     std::vector<const Registration_Entry*> rs =
         find_regs(cls.name_space, cls.class_name, MI_INSTANCE, true, rc, msg);
     if (rc != CMPI_RC_OK)
@@ -1285,7 +1292,8 @@ CMPIrc Host_Impl::do_get(Object_Path path, const char** props, Value& out, std::
                 out = v;
                 return CMPI_RC_OK;
             }
-        return CMPI_RC_ERR_NOT_FOUND;
+        if (!known_ns(path.name_space))
+            return CMPI_RC_ERR_NOT_FOUND;
     }
     std::vector<const Registration_Entry*> rs =
         find_regs(path.name_space, path.class_name, MI_INSTANCE, false, rc, msg);
@@ -1430,7 +1438,7 @@ CMPIrc Host_Impl::do_assoc(Assoc_Op op, Object_Path path, const std::string& ass
     CMPIrc rc = check_ns(path.name_space, msg);
     if (rc != CMPI_RC_OK)
         return rc;
-    if (is_interop(path.name_space))
+    if (is_interop(path.name_space) && !known_ns(path.name_space))
         return CMPI_RC_OK;
     if (!knows_class(path.class_name))
     {
