@@ -218,10 +218,15 @@ static bool _lookUpHost(const char* name, struct hostent& entry,
     }
 }
 
+// As strncpy: at most size bytes, the rest of them zero, no terminator
+// added when the text fills them all.
 static void _copyOut(char* to, const char* from, int size)
 {
-    if (to && size > 0)
-        strncpy(to, from, size);
+    if (!to || size <= 0)
+        return;
+    size_t n = strnlen(from, (size_t)size);
+    memcpy(to, from, n);
+    memset(to + n, 0, (size_t)size - n);
 }
 
 // The host facts as getHostInfo tells them; copied reports whether
