@@ -28,10 +28,14 @@ void sleepMs(int ms)
         std::this_thread::sleep_for(std::chrono::milliseconds(ms));
 }
 
+// The kinds of fault that bend the entry's own reply instead of replacing it.
+enum Reshape { RESHAPE_NONE, RESHAPE_SHAPE, RESHAPE_MISTYPED };
+
 // Decides whether this call of `entry` is taken over by an injected fault.
 // Throws for the kinds that throw; returns true with the reply set for the
-// kinds that answer.
-bool applyFault(const char* entry, Json::Value& reply)
+// kinds that answer. For the kinds that bend the reply, `later` says how,
+// and the entry answers on.
+bool applyFault(const char* entry, Json::Value& reply, Reshape* later = nullptr)
 {
     State& s = state();
     Fault f;
@@ -56,7 +60,61 @@ bool applyFault(const char* entry, Json::Value& reply)
         throw std::runtime_error(f.message);
     if (f.kind == "unknown")
         throw f.code;
+    if (later && f.kind == "shape")
+        *later = RESHAPE_SHAPE;
+    if (later && f.kind == "mistyped")
+        *later = RESHAPE_MISTYPED;
     return false;  // a plain delay
+}
+
+// A scalar of another type than its own: what a library whose reply
+// doesn't match its documentation hands over.
+Json::Value mistyped(const Json::Value& v)
+{
+    switch (v.type()) {
+    case Json::nullValue: return Json::Value("");
+    case Json::stringValue: return Json::Value(Json::UInt(v.asString().size()));
+    case Json::booleanValue: return Json::Value(v.asBool() ? "true" : "false");
+    case Json::intValue:
+    case Json::uintValue:
+    case Json::realValue: return Json::Value(v.asString());
+    case Json::arrayValue: {
+        Json::Value r(Json::arrayValue);
+        for (const Json::Value& e : v)
+            r.append(mistyped(e));
+        return r;
+    }
+    case Json::objectValue: {
+        Json::Value r(Json::objectValue);
+        for (const std::string& m : v.getMemberNames())
+            r[m] = mistyped(v[m]);
+        return r;
+    }
+    }
+    return v;
+}
+
+Json::Value reshaped(Json::Value reply, Reshape how)
+{
+    switch (how) {
+    case RESHAPE_NONE:
+        return reply;
+    case RESHAPE_MISTYPED:
+        return mistyped(reply);
+    case RESHAPE_SHAPE:
+        break;
+    }
+    // The top level of the other kind: an object comes inside an array, an
+    // array's elements come as the members "0", "1"... of an object.
+    if (reply.isArray()) {
+        Json::Value r(Json::objectValue);
+        for (Json::ArrayIndex i = 0; i < reply.size(); i++)
+            r[std::to_string(i)] = reply[i];
+        return r;
+    }
+    Json::Value r(Json::arrayValue);
+    r.append(reply);
+    return r;
 }
 
 // What each entry has cost since its counters were last read and reset:
@@ -102,13 +160,21 @@ private:
     uint64_t callbacks;
 };
 
+Json::Value answer(const char* entry, const Json::Value& req, Handler h);
+
 Json::Value call(const char* entry, const Json::Value& req, Handler h, EntryCounter& counter)
 {
     Counting counting(counter);
     recordCall(entry, req);
     Json::Value reply;
-    if (applyFault(entry, reply) || echoReply(entry, req, reply))
+    Reshape later = RESHAPE_NONE;
+    if (applyFault(entry, reply, &later) || echoReply(entry, req, reply))
         return reply;
+    return reshaped(answer(entry, req, h), later);
+}
+
+Json::Value answer(const char* entry, const Json::Value& req, Handler h)
+{
     State& s = state();
     std::lock_guard<std::mutex> g(s.mtx);
     if (!s.initialised)
@@ -478,16 +544,22 @@ static const char* agentVersion()
     return version.c_str();
 }
 
+// The plain entries log their calls with a null request, so that the log
+// tells every entry a caller reached. Under a fault that bends the reply
+// they answer a value that no real library gives.
 DTRUJ_API const char* get_agt_version()
 {
+    recordCall("get_agt_version", Json::Value());
     Json::Value dummy;
-    if (applyFault("get_agt_version", dummy))
+    Reshape odd = RESHAPE_NONE;
+    if (applyFault("get_agt_version", dummy, &odd))
         return nullptr;
-    return agentVersion();
+    return odd ? "3" : agentVersion();
 }
 
 DTRUJ_API void registerLogMsgCb(LogMsgCB cb)
 {
+    recordCall("registerLogMsgCb", Json::Value());
     Json::Value dummy;
     applyFault("registerLogMsgCb", dummy);
     logCallback().store(cb);
@@ -495,17 +567,15 @@ DTRUJ_API void registerLogMsgCb(LogMsgCB cb)
 
 DTRUJ_API void registerEventProcessingCb(EventProcessCB cb)
 {
+    recordCall("registerEventProcessingCb", Json::Value());
     Json::Value dummy;
     applyFault("registerEventProcessingCb", dummy);
     eventCallback().store(cb);
     notifyEvents(state());
 }
 
-DTRUJ_API Json::Value init_hba_lib(const Json::Value& req)
+static Json::Value initialise(const Json::Value& req)
 {
-    Json::Value reply;
-    if (applyFault("init_hba_lib", reply))
-        return reply;
     State& s = state();
     std::lock_guard<std::mutex> g(s.mtx);
     Json::Value r(Json::objectValue);
@@ -531,23 +601,39 @@ DTRUJ_API Json::Value init_hba_lib(const Json::Value& req)
     return r;
 }
 
+DTRUJ_API Json::Value init_hba_lib(const Json::Value& req)
+{
+    recordCall("init_hba_lib", req);
+    Json::Value reply;
+    Reshape later = RESHAPE_NONE;
+    if (applyFault("init_hba_lib", reply, &later))
+        return reply;
+    return reshaped(initialise(req), later);
+}
+
 DTRUJ_API int free_hba_lib()
 {
+    recordCall("free_hba_lib", Json::Value());
     Json::Value dummy;
-    if (applyFault("free_hba_lib", dummy))
+    Reshape odd = RESHAPE_NONE;
+    if (applyFault("free_hba_lib", dummy, &odd))
         return -1;
     State& s = state();
     stopEvents(s);
     std::lock_guard<std::mutex> g(s.mtx);
     s.initialised = false;
-    return 0;
+    return odd ? 77 : 0;
 }
 
 DTRUJ_API unsigned int getNumberOfAdapters()
 {
+    recordCall("getNumberOfAdapters", Json::Value());
     Json::Value dummy;
-    if (applyFault("getNumberOfAdapters", dummy))
+    Reshape odd = RESHAPE_NONE;
+    if (applyFault("getNumberOfAdapters", dummy, &odd))
         return 65535;
+    if (odd)
+        return 4294967294u;
     State& s = state();
     std::lock_guard<std::mutex> g(s.mtx);
     return s.initialised ? s.host["adapters"].size() : 0;
@@ -555,9 +641,13 @@ DTRUJ_API unsigned int getNumberOfAdapters()
 
 DTRUJ_API int getRequestID()
 {
+    recordCall("getRequestID", Json::Value());
     Json::Value dummy;
-    if (applyFault("getRequestID", dummy))
+    Reshape odd = RESHAPE_NONE;
+    if (applyFault("getRequestID", dummy, &odd))
         return -1;
+    if (odd)
+        return -2147483647 - 1;
     State& s = state();
     std::lock_guard<std::mutex> g(s.mtx);
     if (!s.initialised)
@@ -924,11 +1014,21 @@ Json::Value prepFlash(State& s, const Json::Value& req, FlashJob& job)
 
 } // namespace
 
+static Json::Value updateFlash(const Json::Value& req);
+
 DTRUJ_API Json::Value adapterUpdateFlash(const Json::Value& req)
 {
+    recordCall("adapterUpdateFlash", req);
     Json::Value reply;
-    if (applyFault("adapterUpdateFlash", reply))
+    Reshape later = RESHAPE_NONE;
+    if (applyFault("adapterUpdateFlash", reply, &later))
         return reply;
+    return reshaped(updateFlash(req), later);
+}
+
+static Json::Value updateFlash(const Json::Value& req)
+{
+    Json::Value reply;
     State& s = state();
     FlashJob job;
     {
@@ -1966,13 +2066,24 @@ JSON_ENTRY(getDPortTestResult)
 
 namespace {
 
+Json::Value testNow(const char* entry, const Json::Value& req,
+                    Json::Value (*prepare)(State&, const Json::Value&, int&));
+
 Json::Value runDirect(const char* entry, const Json::Value& req,
                       Json::Value (*prepare)(State&, const Json::Value&, int&))
 {
     recordCall(entry, req);
     Json::Value reply;
-    if (applyFault(entry, reply) || echoReply(entry, req, reply))
+    Reshape later = RESHAPE_NONE;
+    if (applyFault(entry, reply, &later) || echoReply(entry, req, reply))
         return reply;
+    return reshaped(testNow(entry, req, prepare), later);
+}
+
+Json::Value testNow(const char* entry, const Json::Value& req,
+                    Json::Value (*prepare)(State&, const Json::Value&, int&))
+{
+    Json::Value reply;
     State& s = state();
     int delay = 0;
     {

@@ -691,7 +691,8 @@ bool parseFault(const Json::Value& v, Fault& f, std::string& err)
         f.delayMs = atoi(f.kind.c_str() + 6);
         f.kind = "delay";
     }
-    static const char* const kinds[] = {"null", "error", "hba", "std", "unknown", "delay", nullptr};
+    static const char* const kinds[] = {"null", "error", "hba", "std", "unknown", "delay",
+                                        "shape", "mistyped", nullptr};
     for (const char* const* k = kinds; *k; ++k)
         if (f.kind == *k)
             return true;

@@ -23,7 +23,7 @@ namespace Sim {
 
 // What an injected fault does to the next call(s) of one entry.
 struct Fault {
-    std::string kind;       // null, error, hba, std, unknown, delay
+    std::string kind;       // null, error, hba, std, unknown, delay, shape, mistyped
     int code = 1;
     std::string message = "injected fault";
     int delayMs = 0;

@@ -121,4 +121,59 @@ TEST_F(DtrujFaults, NotInitialisedAnswersError)
     EXPECT_EQ(-1, lib.sym<OLMA::voidRetIntFP>("getRequestID")());
 }
 
+// A reply of the wrong shape: the top level of the other kind, or every
+// value inside of another type; the entry still acts as it would.
+TEST_F(DtrujFaults, BentReplies)
+{
+    Json::Value req = obj({{"wwn", FC_HBA}});
+    Json::Value healthy = lib.call("getHbaByWwn", req);
+    ASSERT_EQ(0, lib.setFault("getHbaByWwn", "shape"));
+    Json::Value r = lib.call("getHbaByWwn", req);
+    ASSERT_TRUE(r.isArray());
+    ASSERT_EQ(1u, r.size());
+    EXPECT_EQ(healthy, r[0]);
+
+    Json::Value lrq = obj({{"pPortWwn", FC_PORT0}});
+    Json::Value list = lib.call("getAllRemotePorts", lrq);
+    ASSERT_TRUE(list.isArray() && list.size() > 1);
+    ASSERT_EQ(0, lib.setFault("getAllRemotePorts", "shape"));
+    r = lib.call("getAllRemotePorts", lrq);
+    ASSERT_TRUE(r.isObject());
+    EXPECT_EQ(list[1], r["1"]);
+
+    ASSERT_EQ(0, lib.setFault("getHbaByWwn", "mistyped"));
+    r = lib.call("getHbaByWwn", req);
+    ASSERT_TRUE(r.isObject());
+    ASSERT_TRUE(r["hbaData"].isObject());
+    EXPECT_TRUE(r["hbaData"]["wwn"].isNumeric());
+    EXPECT_EQ(23u, r["hbaData"]["wwn"].asUInt());
+    EXPECT_TRUE(r["hbaData"]["isCNA"].isString());
+    EXPECT_TRUE(r["hbaData"]["adapterId"].isString());
+
+    // The plain entries answer values no real library gives.
+    ASSERT_EQ(0, lib.setFault("get_agt_version", "shape"));
+    EXPECT_STREQ("3", lib.sym<OLMA::voidRetStrFP>("get_agt_version")());
+    ASSERT_EQ(0, lib.setFault("getNumberOfAdapters", "mistyped"));
+    EXPECT_EQ(4294967294u, lib.sym<OLMA::voidRetUIntFP>("getNumberOfAdapters")());
+    ASSERT_EQ(0, lib.setFault("getRequestID", "shape"));
+    EXPECT_GT(0, lib.sym<OLMA::voidRetIntFP>("getRequestID")());
+}
+
+// Every entry, plain ones too, leaves its call in the log.
+TEST_F(DtrujFaults, CallLogHoldsEveryEntry)
+{
+    auto calls = lib.sym<char* (*)()>("dtruj_sim_calls");
+    lib.sym<void (*)()>("dtruj_sim_clear_calls")();
+    lib.sym<OLMA::voidRetIntFP>("getRequestID")();
+    lib.call("getHost");
+    char* text = calls();
+    Json::Value log;
+    ASSERT_TRUE(Json::Reader().parse(text, log));
+    free(text);
+    ASSERT_EQ(2u, log.size());
+    EXPECT_EQ("getRequestID", log[0]["entry"].asString());
+    EXPECT_TRUE(log[0]["request"].isNull());
+    EXPECT_EQ("getHost", log[1]["entry"].asString());
+}
+
 } // namespace
