@@ -47,8 +47,13 @@
 //    keeps only the properties of the list and of the key list the provider
 //    gives: a provider that passes no key list returns paths without keys.
 //
-// A Host is not meant to be shared between threads that call it at the same
-// time; providers' own threads may call the broker at any time.
+// Threads. As a server serves each request on a thread of its own and calls
+// providers side by side, the operations (ei ... eq, subscribe and
+// unsubscribe) may be called from several threads at once; cleanup() and
+// the set_* switches wait for the operations under way and hold off new
+// ones, as a server serialises a provider's cleanup with its requests.
+// Providers' own threads may call the broker at any time. What each thread
+// makes belongs to its own request.
 
 #include <cstdint>
 #include <memory>
@@ -314,6 +319,18 @@ public:
     bool parse_object_path(const std::string& text, Object_Path& path, std::string& err) const;
     bool parse_argument(const Object_Path& path, const std::string& method,
                         const std::string& text, Property& arg, std::string& err) const;
+
+    // Broker faults. Every call a provider makes of the broker's functions
+    // and of the CMPI objects' own functions, but release and
+    // detachThread, is counted from the last of these calls on (from every
+    // thread). fail_broker_calls() makes the `first`-th call from now (1 for
+    // the very next) and the `count` - 1 after it fail (`count` 0: every
+    // later one), as a server short of memory fails them: a null object, a
+    // CMPI_RC_ERR_FAILED status, a value of state CMPI_badValue; the host's
+    // own work goes on. clear_broker_faults() ends the plan.
+    void fail_broker_calls(uint64_t first, uint64_t count = 1);
+    void clear_broker_faults();
+    uint64_t broker_calls() const;
 
     // Raw access for tests that talk CMPI themselves.
     const CMPIBroker* broker() const;

@@ -8,6 +8,7 @@
 #include <cstring>
 #include <dlfcn.h>
 #include <pthread.h>
+#include <shared_mutex>
 #include <time.h>
 #include <unistd.h>
 
@@ -121,6 +122,9 @@ struct Prop_List
 
 } // namespace
 
+typedef std::shared_lock<std::shared_mutex> Request_Hold;
+typedef std::unique_lock<std::shared_mutex> Exclusive_Hold;
+
 class Host_Impl
 {
 public:
@@ -132,6 +136,12 @@ public:
     Catalogue cat;
     std::map<std::string, Provider_State> providers;
     std::recursive_mutex mi_mutex;
+    // Requests run side by side under a shared hold; cleanup and the
+    // switches wait for them and hold off new ones, as a server serialises
+    // a provider's cleanup with its requests.
+    std::shared_mutex ops_mutex;
+    // Subscriptions and their providers' filter counts change one at a time.
+    std::mutex sub_mutex;
     CMPIBroker broker;
     CMPIBrokerFT bft;
     CMPIBrokerEncFT eft;
@@ -748,6 +758,8 @@ CMPIString* e_get_type(const CMPIBroker*, const void* object, CMPIStatus* rc)
 CMPIString* e_get_message(const CMPIBroker*, const char*, const char* def_msg, CMPIStatus* rc,
                           CMPICount count, ...)
 {
+    if (broker_call_fails())
+        return failed_call<CMPIString*>(rc);
     // The host has no message catalogue: the default text, with $0, $1...
     // replaced by the arguments.
     std::vector<std::string> args;
@@ -1004,43 +1016,44 @@ Host_Impl::Host_Impl(const Options& o) : opts(o)
                              CMPI_MB_OSEncapsulationSupport;
     bft.brokerVersion = 100;
     bft.brokerName = "cimhost";
-    bft.prepareAttachThread = b_prepare_attach;
-    bft.attachThread = b_attach;
+    bft.prepareAttachThread = FALLIBLE(b_prepare_attach);
+    bft.attachThread = FALLIBLE(b_attach);
+    // Letting go never fails, as release doesn't.
     bft.detachThread = b_detach;
-    bft.deliverIndication = b_deliver;
-    bft.enumerateInstanceNames = b_enum_names;
-    bft.getInstance = b_get;
-    bft.createInstance = b_create;
-    bft.modifyInstance = b_modify;
-    bft.deleteInstance = b_delete;
-    bft.execQuery = b_query;
-    bft.enumerateInstances = b_enum;
-    bft.associators = b_associators;
-    bft.associatorNames = b_associator_names;
-    bft.references = b_references;
-    bft.referenceNames = b_reference_names;
-    bft.invokeMethod = b_invoke;
-    bft.setProperty = b_set_property;
-    bft.getProperty = b_get_property;
+    bft.deliverIndication = FALLIBLE(b_deliver);
+    bft.enumerateInstanceNames = FALLIBLE(b_enum_names);
+    bft.getInstance = FALLIBLE(b_get);
+    bft.createInstance = FALLIBLE(b_create);
+    bft.modifyInstance = FALLIBLE(b_modify);
+    bft.deleteInstance = FALLIBLE(b_delete);
+    bft.execQuery = FALLIBLE(b_query);
+    bft.enumerateInstances = FALLIBLE(b_enum);
+    bft.associators = FALLIBLE(b_associators);
+    bft.associatorNames = FALLIBLE(b_associator_names);
+    bft.references = FALLIBLE(b_references);
+    bft.referenceNames = FALLIBLE(b_reference_names);
+    bft.invokeMethod = FALLIBLE(b_invoke);
+    bft.setProperty = FALLIBLE(b_set_property);
+    bft.getProperty = FALLIBLE(b_get_property);
 
     memset(&eft, 0, sizeof(eft));
     eft.ftVersion = 100;
-    eft.newInstance = e_new_instance;
-    eft.newObjectPath = e_new_path;
-    eft.newArgs = e_new_args;
-    eft.newString = e_new_string;
-    eft.newArray = e_new_array;
-    eft.newDateTime = e_new_datetime;
-    eft.newDateTimeFromBinary = e_new_datetime_bin;
-    eft.newDateTimeFromChars = e_new_datetime_chars;
-    eft.newSelectExp = e_new_select;
-    eft.classPathIsA = e_class_path_is_a;
-    eft.toString = e_to_string;
-    eft.isOfType = e_is_of_type;
-    eft.getType = e_get_type;
+    eft.newInstance = FALLIBLE(e_new_instance);
+    eft.newObjectPath = FALLIBLE(e_new_path);
+    eft.newArgs = FALLIBLE(e_new_args);
+    eft.newString = FALLIBLE(e_new_string);
+    eft.newArray = FALLIBLE(e_new_array);
+    eft.newDateTime = FALLIBLE(e_new_datetime);
+    eft.newDateTimeFromBinary = FALLIBLE(e_new_datetime_bin);
+    eft.newDateTimeFromChars = FALLIBLE(e_new_datetime_chars);
+    eft.newSelectExp = FALLIBLE(e_new_select);
+    eft.classPathIsA = FALLIBLE(e_class_path_is_a);
+    eft.toString = FALLIBLE(e_to_string);
+    eft.isOfType = FALLIBLE(e_is_of_type);
+    eft.getType = FALLIBLE(e_get_type);
     eft.getMessage = e_get_message;
-    eft.logMessage = e_log;
-    eft.trace = e_trace;
+    eft.logMessage = FALLIBLE(e_log);
+    eft.trace = FALLIBLE(e_trace);
 
     memset(&xft, 0, sizeof(xft));
     xft.ftVersion = 100;
@@ -1785,17 +1798,20 @@ const std::string& Host::error() const
 
 void Host::set_interop(bool on, bool empty)
 {
+    Exclusive_Hold hold(impl->ops_mutex);
     impl->opts.interop = on;
     impl->opts.interop_empty = empty;
 }
 
 void Host::set_interop_namespace(const std::string& name_space)
 {
+    Exclusive_Hold hold(impl->ops_mutex);
     impl->opts.interop_namespace = name_space;
 }
 
 void Host::set_pegasus_enumerations(bool on)
 {
+    Exclusive_Hold hold(impl->ops_mutex);
     impl->opts.pegasus_enumerations = on;
 }
 
@@ -1834,6 +1850,7 @@ Result Host::ei(const Object_Path& cls, const std::vector<std::string>* props)
 {
     if (!impl->ok)
         return not_loaded(impl);
+    Request_Hold hold(impl->ops_mutex);
     Result r;
     std::vector<Value> items;
     {
@@ -1849,6 +1866,7 @@ Result Host::ein(const Object_Path& cls)
 {
     if (!impl->ok)
         return not_loaded(impl);
+    Request_Hold hold(impl->ops_mutex);
     Result r;
     std::vector<Value> items;
     {
@@ -1863,6 +1881,7 @@ Result Host::gi(const Object_Path& path, const std::vector<std::string>* props)
 {
     if (!impl->ok)
         return not_loaded(impl);
+    Request_Hold hold(impl->ops_mutex);
     Result r;
     Value v;
     {
@@ -1882,6 +1901,7 @@ static Result assoc(Host_Impl* impl, Assoc_Op op, const Object_Path& path,
 {
     if (!impl->ok)
         return not_loaded(impl);
+    Request_Hold hold(impl->ops_mutex);
     Result r;
     std::vector<Value> items;
     {
@@ -1924,6 +1944,7 @@ Result Host::cm(const Object_Path& path, const std::string& method, const std::v
 {
     if (!impl->ok)
         return not_loaded(impl);
+    Request_Hold hold(impl->ops_mutex);
     Result r;
     {
         Op_Scope scope;
@@ -1936,6 +1957,7 @@ Result Host::ci(const Object_Path& path, const Instance& inst)
 {
     if (!impl->ok)
         return not_loaded(impl);
+    Request_Hold hold(impl->ops_mutex);
     Result r;
     Instance i = inst;
     if (i.class_name.empty())
@@ -1957,6 +1979,7 @@ Result Host::mi(const Object_Path& path, const Instance& inst,
 {
     if (!impl->ok)
         return not_loaded(impl);
+    Request_Hold hold(impl->ops_mutex);
     Result r;
     Instance i = inst;
     if (i.class_name.empty())
@@ -1973,6 +1996,7 @@ Result Host::di(const Object_Path& path)
 {
     if (!impl->ok)
         return not_loaded(impl);
+    Request_Hold hold(impl->ops_mutex);
     Result r;
     Op_Scope scope;
     r.rc = impl->do_delete(path, r.message);
@@ -1983,6 +2007,7 @@ Result Host::eq(const Object_Path& cls, const std::string& query, const std::str
 {
     if (!impl->ok)
         return not_loaded(impl);
+    Request_Hold hold(impl->ops_mutex);
     Result r;
     std::vector<Value> items;
     {
@@ -1998,6 +2023,8 @@ Result Host::subscribe(const std::string& name_space, const std::string& class_n
 {
     if (!impl->ok)
         return not_loaded(impl);
+    Request_Hold hold(impl->ops_mutex);
+    std::lock_guard<std::mutex> one(impl->sub_mutex);
     Op_Scope scope;
     return impl->subscribe(name_space, class_name, id, query);
 }
@@ -2006,12 +2033,15 @@ Result Host::unsubscribe(int id)
 {
     if (!impl->ok)
         return not_loaded(impl);
+    Request_Hold hold(impl->ops_mutex);
+    std::lock_guard<std::mutex> one(impl->sub_mutex);
     Op_Scope scope;
     return impl->unsubscribe(id);
 }
 
 size_t Host::active_filters() const
 {
+    std::lock_guard<std::mutex> one(impl->sub_mutex);
     return impl->subs.size();
 }
 
@@ -2037,6 +2067,7 @@ size_t Host::wait_indications(size_t count, int timeout_ms) const
 
 int Host::cleanup(bool terminating)
 {
+    Exclusive_Hold hold(impl->ops_mutex);
     return impl->cleanup(terminating);
 }
 
@@ -2183,6 +2214,27 @@ bool Host::parse_argument(const Object_Path& path, const std::string& method,
         type_keys(*arg.value.ref);
     }
     return true;
+}
+
+void Host::fail_broker_calls(uint64_t first, uint64_t count)
+{
+    Broker_Faults& f = broker_faults();
+    f.first.store(0);
+    f.calls.store(0);
+    f.last.store(count ? first + count - 1 : UINT64_MAX);
+    f.first.store(first);
+}
+
+void Host::clear_broker_faults()
+{
+    Broker_Faults& f = broker_faults();
+    f.first.store(0);
+    f.calls.store(0);
+}
+
+uint64_t Host::broker_calls() const
+{
+    return broker_faults().calls.load();
 }
 
 const CMPIBroker* Host::broker() const

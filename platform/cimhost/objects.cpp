@@ -373,8 +373,10 @@ CMPIStatus ctx_add(const CMPIContext* c, const char* name, const CMPIValue* v, C
     return status(CMPI_RC_OK);
 }
 
-CMPIContextFT context_ft = {100, ctx_release, ctx_clone, ctx_get_entry, ctx_get_entry_at,
-                            ctx_count, ctx_add};
+CMPIContextFT context_ft = {
+    100, ctx_release, FALLIBLE(ctx_clone), FALLIBLE(ctx_get_entry), FALLIBLE(ctx_get_entry_at),
+    FALLIBLE(ctx_count), FALLIBLE(ctx_add)
+};
 
 //
 // Result: what a provider returns is consumed, and so read, at the call.
@@ -433,7 +435,10 @@ CMPIStatus res_done(const CMPIResult* r)
     return status(CMPI_RC_OK);
 }
 
-CMPIResultFT result_ft = {100, res_release, res_clone, res_data, res_instance, res_path, res_done};
+CMPIResultFT result_ft = {
+    100, res_release, FALLIBLE(res_clone), FALLIBLE(res_data), FALLIBLE(res_instance),
+    FALLIBLE(res_path), FALLIBLE(res_done)
+};
 
 //
 // Instance
@@ -594,9 +599,11 @@ CMPIStatus inst_set_path(CMPIInstance* i, const CMPIObjectPath* p)
     return status(CMPI_RC_OK);
 }
 
-CMPIInstanceFT instance_ft = {100,         inst_release,   inst_clone,      inst_get,
-                              inst_get_at, inst_count,     inst_set,        inst_get_path,
-                              inst_set_filter, inst_set_path};
+CMPIInstanceFT instance_ft = {
+    100, inst_release, FALLIBLE(inst_clone), FALLIBLE(inst_get), FALLIBLE(inst_get_at),
+    FALLIBLE(inst_count), FALLIBLE(inst_set), FALLIBLE(inst_get_path), FALLIBLE(inst_set_filter),
+    FALLIBLE(inst_set_path)
+};
 
 //
 // Object path
@@ -755,26 +762,14 @@ CMPIString* path_to_string(const CMPIObjectPath* p, CMPIStatus* rc)
     return o ? new_string(read_path(o, "CMObjectPathToString").to_string().c_str()) : nullptr;
 }
 
-CMPIObjectPathFT path_ft = {100,
-                            path_release,
-                            path_clone,
-                            path_set_ns,
-                            path_get_ns,
-                            path_set_host,
-                            path_get_host,
-                            path_set_class,
-                            path_get_class,
-                            path_add_key,
-                            path_get_key,
-                            path_get_key_at,
-                            path_key_count,
-                            path_ns_from,
-                            path_host_ns_from,
-                            path_class_q,
-                            path_prop_q,
-                            path_prop_q,
-                            path_param_q,
-                            path_to_string};
+CMPIObjectPathFT path_ft = {
+    100, path_release, FALLIBLE(path_clone), FALLIBLE(path_set_ns), FALLIBLE(path_get_ns),
+    FALLIBLE(path_set_host), FALLIBLE(path_get_host), FALLIBLE(path_set_class),
+    FALLIBLE(path_get_class), FALLIBLE(path_add_key), FALLIBLE(path_get_key),
+    FALLIBLE(path_get_key_at), FALLIBLE(path_key_count), FALLIBLE(path_ns_from),
+    FALLIBLE(path_host_ns_from), FALLIBLE(path_class_q), FALLIBLE(path_prop_q),
+    FALLIBLE(path_prop_q), FALLIBLE(path_param_q), FALLIBLE(path_to_string)
+};
 
 //
 // Args
@@ -833,7 +828,10 @@ CMPICount args_count(const CMPIArgs* a, CMPIStatus* rc)
     return o ? CMPICount(o->args.size()) : 0;
 }
 
-CMPIArgsFT args_ft = {100, args_release, args_clone, args_add, args_get, args_get_at, args_count};
+CMPIArgsFT args_ft = {
+    100, args_release, FALLIBLE(args_clone), FALLIBLE(args_add), FALLIBLE(args_get),
+    FALLIBLE(args_get_at), FALLIBLE(args_count)
+};
 
 //
 // String
@@ -857,7 +855,7 @@ char* str_chars(const CMPIString* s, CMPIStatus* rc)
     return &o->s[0];
 }
 
-CMPIStringFT string_ft = {100, str_release, str_clone, str_chars};
+CMPIStringFT string_ft = {100, str_release, FALLIBLE(str_clone), FALLIBLE(str_chars)};
 
 //
 // Array
@@ -933,7 +931,10 @@ CMPIStatus arr_set(CMPIArray* a, CMPICount i, const CMPIValue* v, CMPIType t)
     return status(CMPI_RC_OK);
 }
 
-CMPIArrayFT array_ft = {100, arr_release, arr_clone, arr_size, arr_type, arr_get, arr_set};
+CMPIArrayFT array_ft = {
+    100, arr_release, FALLIBLE(arr_clone), FALLIBLE(arr_size), FALLIBLE(arr_type),
+    FALLIBLE(arr_get), FALLIBLE(arr_set)
+};
 
 //
 // Enumeration
@@ -993,8 +994,10 @@ CMPIArray* enum_to_array(const CMPIEnumeration* e, CMPIStatus* rc)
     return a;
 }
 
-CMPIEnumerationFT enum_ft = {100, enum_release, enum_clone, enum_next, enum_has_next,
-                             enum_to_array};
+CMPIEnumerationFT enum_ft = {
+    100, enum_release, FALLIBLE(enum_clone), FALLIBLE(enum_next), FALLIBLE(enum_has_next),
+    FALLIBLE(enum_to_array)
+};
 
 //
 // Datetime
@@ -1030,7 +1033,10 @@ CMPIBoolean dt_interval(const CMPIDateTime* d, CMPIStatus* rc)
     return o && datetime_is_interval(o->text);
 }
 
-CMPIDateTimeFT datetime_ft = {100, dt_release, dt_clone, dt_binary, dt_string, dt_interval};
+CMPIDateTimeFT datetime_ft = {
+    100, dt_release, FALLIBLE(dt_clone), FALLIBLE(dt_binary), FALLIBLE(dt_string),
+    FALLIBLE(dt_interval)
+};
 
 //
 // Select expression: the host's filters select whole classes.
@@ -1078,8 +1084,10 @@ CMPIBoolean se_accessor(const CMPISelectExp*, CMPIAccessor*, void*, CMPIStatus* 
     return 0;
 }
 
-CMPISelectExpFT select_ft = {100, se_release, se_clone, se_evaluate, se_string, se_cond, se_cond,
-                             se_accessor};
+CMPISelectExpFT select_ft = {
+    100, se_release, FALLIBLE(se_clone), FALLIBLE(se_evaluate), FALLIBLE(se_string),
+    FALLIBLE(se_cond), FALLIBLE(se_cond), FALLIBLE(se_accessor)
+};
 
 //
 // Reading what containers keep.
@@ -1206,6 +1214,20 @@ Value resolve_at(const Held& h, const Where& where, int depth)
 }
 
 } // namespace
+
+Broker_Faults& broker_faults()
+{
+    static Broker_Faults f;
+    return f;
+}
+
+bool broker_call_fails()
+{
+    Broker_Faults& f = broker_faults();
+    uint64_t n = f.calls.fetch_add(1, std::memory_order_relaxed) + 1;
+    uint64_t first = f.first.load(std::memory_order_relaxed);
+    return first && n >= first && n <= f.last.load(std::memory_order_relaxed);
+}
 
 [[noreturn]] void used_after_release(const Obj* o, const std::string& where)
 {

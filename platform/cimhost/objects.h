@@ -16,7 +16,11 @@
 // any later use of it, directly or through a container that kept its
 // pointer, aborts with a message that names it.
 
+#include <atomic>
 #include <mutex>
+#include <type_traits>
+
+#include <cstring>
 
 #include "internal.h"
 
@@ -254,6 +258,65 @@ inline void set_rc(CMPIStatus* rc, CMPIrc code)
         rc->msg = nullptr;
     }
 }
+
+// Broker faults. Every call that a provider makes of the broker's functions
+// or of a CMPI object's own functions (but release) is counted; those of a
+// planned range fail as a server short of memory, or one whose client went
+// away, fails them: a null object, a failed status, a bad value.
+struct Broker_Faults
+{
+    std::atomic<uint64_t> calls {0};
+    std::atomic<uint64_t> first {0};   // 0: none planned
+    std::atomic<uint64_t> last {0};    // inclusive; UINT64_MAX for no end
+};
+Broker_Faults& broker_faults();
+
+// Counts this call; true if it is to fail.
+bool broker_call_fails();
+
+inline void fail_rc(CMPIStatus* rc)
+{
+    set_rc(rc, CMPI_RC_ERR_FAILED);
+}
+template <class T>
+void fail_rc(T)
+{
+}
+
+template <class R, class... A>
+R failed_call(A... a)
+{
+    (fail_rc(a), ...);
+    if constexpr (std::is_same<R, CMPIStatus>::value)
+        return status(CMPI_RC_ERR_FAILED);
+    else if constexpr (std::is_same<R, CMPIData>::value)
+    {
+        CMPIData d;
+        memset(&d, 0, sizeof(d));
+        d.type = CMPI_null;
+        d.state = CMPI_badValue;
+        return d;
+    }
+    else
+        return R();
+}
+
+// A function of a table, counted and failed as planned.
+template <auto F>
+struct Fallible;
+
+template <class R, class... A, R (*F)(A...)>
+struct Fallible<F>
+{
+    static R call(A... a)
+    {
+        if (broker_call_fails())
+            return failed_call<R>(a...);
+        return F(a...);
+    }
+};
+
+#define FALLIBLE(f) (&::OLMA::cimhost::Fallible<&(f)>::call)
 
 // Provided by the host: the class knowledge of the loaded module.
 const Catalogue* host_catalogue();
