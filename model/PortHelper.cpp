@@ -1022,7 +1022,8 @@ int PortHelper::getOpticsInfo(String index, Json::Value& reply)
     bool called = callLib("libGetOpticsSFP", libGetOpticsSFP, request, reply,
         CALL_INDEXED, index.c_str());
 
-    if (!called || !isGood(reply))
+    // The optics are read by member: a reply of another shape describes none.
+    if (!called || !isGood(reply) || !reply.isObject())
     {
         TLOG(LL_ERR, "Unable to get SFP info for %s", index.c_str());
         return -1;

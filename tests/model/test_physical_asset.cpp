@@ -122,6 +122,9 @@ TEST_F(PhysicalAssetTest, FaultsAtEachEntry)
         {"getPortByWwn", "unknown", {}},
         {"getOpticsSFP", "null", {}},
         {"getOpticsSFP", "{\"kind\": \"unknown\", \"count\": 2}", {"SFP-9_3_1"}},
+        // A reply that isn't an object describes no optics, also where the
+        // library said there were none (an error in an array).
+        {"getOpticsSFP", "shape", {}},
     };
     LogMark mark;
 
