@@ -338,6 +338,9 @@ public:
     // operations if nothing leaked into the global scope. Objects that an
     // attached thread makes count until it detaches.
     size_t live_objects() const;
+    // What the objects left in the global scope are ("CMPIString \"x\"",
+    // "CMPIInstance of root/vespera:VESPERA_FCPort"...), newest first.
+    std::vector<std::string> left_objects() const;
 
 private:
     Host_Impl* impl;

@@ -315,7 +315,13 @@ CMPIStatus b_detach(const CMPIBroker* mb, const CMPIContext* ctx)
     if (!host_of(mb))
         return status(CMPI_RC_ERR_INVALID_HANDLE);
     if (attached.empty())
+    {
+        // The attach failed or never came: the thread made nothing of its
+        // own, but the context prepared for it is still taken back here.
+        if (obj_cast<Ctx_Obj>(ctx, K_CONTEXT))
+            release_obj(ctx);
         return status(CMPI_RC_ERR_FAILED);
+    }
     Arena* a = attached.back();
     attached.pop_back();
     pop_arena();
@@ -2245,6 +2251,11 @@ const CMPIBroker* Host::broker() const
 size_t Host::live_objects() const
 {
     return live_object_count();
+}
+
+std::vector<std::string> Host::left_objects() const
+{
+    return live_object_descriptions();
 }
 
 } // namespace cimhost

@@ -1,5 +1,6 @@
 // The encapsulated CMPI objects and their function tables.
 
+#include <cstdlib>
 #include <cstring>
 
 #include "objects.h"
@@ -1221,12 +1222,28 @@ Broker_Faults& broker_faults()
     return f;
 }
 
-bool broker_call_fails()
+bool broker_call_fails(const char* name)
 {
+    static const bool trace = getenv("CIMHOST_TRACE_BROKER") != nullptr;
     Broker_Faults& f = broker_faults();
     uint64_t n = f.calls.fetch_add(1, std::memory_order_relaxed) + 1;
     uint64_t first = f.first.load(std::memory_order_relaxed);
-    return first && n >= first && n <= f.last.load(std::memory_order_relaxed);
+    bool fails = first && n >= first && n <= f.last.load(std::memory_order_relaxed);
+    if (trace && name)
+    {
+        // "... [with R = ...; A = {...}; R (* F)(A ...) = ...::b_attach]": the function.
+        std::string which = name;
+        size_t eq = which.rfind(" = ");
+        if (eq != std::string::npos)
+            which = which.substr(eq + 3);
+        which = which.substr(0, which.find_first_of(";]"));
+        size_t colon = which.rfind("::");
+        if (colon != std::string::npos)
+            which = which.substr(colon + 2);
+        fprintf(stderr, "cimhost: broker call %llu: %s%s\n", (unsigned long long)n,
+                which.c_str(), fails ? " (fails)" : "");
+    }
+    return fails;
 }
 
 [[noreturn]] void used_after_release(const Obj* o, const std::string& where)
@@ -1294,6 +1311,15 @@ void free_arena(Arena* a)
             break;
         delete_obj(o);
     }
+}
+
+std::vector<std::string> live_object_descriptions()
+{
+    std::vector<std::string> out;
+    std::lock_guard<std::mutex> g(arena_mutex);
+    for (const Obj* o = the_host_arena.head; o; o = o->next)
+        out.push_back(describe(o));
+    return out;
 }
 
 size_t live_object_count()

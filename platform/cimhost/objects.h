@@ -168,6 +168,8 @@ void free_arena(Arena* a);
 // The host's own arena: objects made on threads with no scope.
 Arena* host_arena();
 size_t live_object_count();
+// What each live object is, newest first in each arena.
+std::vector<std::string> live_object_descriptions();
 
 // Poisons an object of ours; false if it isn't one. Releasing one twice
 // aborts.
@@ -271,8 +273,9 @@ struct Broker_Faults
 };
 Broker_Faults& broker_faults();
 
-// Counts this call; true if it is to fail.
-bool broker_call_fails();
+// Counts this call; true if it is to fail. With CIMHOST_TRACE_BROKER set in
+// the environment, each call is printed with its number and `name`.
+bool broker_call_fails(const char* name = nullptr);
 
 inline void fail_rc(CMPIStatus* rc)
 {
@@ -310,7 +313,7 @@ struct Fallible<F>
 {
     static R call(A... a)
     {
-        if (broker_call_fails())
+        if (broker_call_fails(__PRETTY_FUNCTION__))
             return failed_call<R>(a...);
         return F(a...);
     }

@@ -531,7 +531,8 @@ std::string rcAnswer(CMPIrc rc)
     return rc == CMPI_RC_OK ? "ok" : "rc:" + ch::rc_name(rc);
 }
 
-// The state of a job, 0 if there is none of that name.
+// The state of a job, 0 if there is none of that name; with no name, 4
+// (running) while any job runs, else 7.
 unsigned jobState(const std::string& job, Fault fault)
 {
     if (fault.entry)
@@ -539,16 +540,21 @@ unsigned jobState(const std::string& job, Fault fault)
     ch::Result r = host().ei(classPath("VESPERA_ConcreteJob"));
     if (fault.entry)
         dtruj_sim_set_fault(fault.entry, fault.kind);
+    unsigned any = 7;
     for (const ch::Instance& j : r.instances)
-        if (j.get_text("InstanceID") == job)
-            if (const ch::Value* s = j.get("JobState"))
+        if (const ch::Value* s = j.get("JobState"))
+        {
+            if (j.get_text("InstanceID") == job)
                 return s->num.uint16;
-    return 0;
+            if (s->num.uint16 == 4)
+                any = 4;
+        }
+    return job.empty() ? any : 0;
 }
 
 } // namespace
 
-Outcome run(const Op& op, int jobTimeoutMs, Fault fault)
+Outcome run(const Op& op, int jobTimeoutMs, Fault fault, const std::function<void()>& started)
 {
     ch::Host& h = host();
     Outcome o;
@@ -565,15 +571,19 @@ Outcome run(const Op& op, int jobTimeoutMs, Fault fault)
     case OP_METHOD:
     {
         r = h.cm(op.path, op.method, op.in);
+        if (started)
+            started();
         o.rc = r.rc;
         o.value = r.return_value.null ? 0 : r.return_value.num.uint32;
         o.answer = r.rc != CMPI_RC_OK ? rcAnswer(r.rc) : "rv:" + std::to_string(o.value);
         o.detail = r.message;
-        if (op.method != "RunDiagnostic" || o.value != 4096)
+        if (op.method != "RunDiagnostic")
             return o;
+        // The job of a test that started; any job that runs, when the
+        // answer was lost on the way.
         std::string job;
         for (const ch::Property& out : r.out)
-            if (out.name == "Job" && out.value.ref)
+            if (o.value == 4096 && out.name == "Job" && out.value.ref)
                 if (const ch::Value* id = out.value.ref->key("InstanceID"))
                     job = id->str;
         auto end = std::chrono::steady_clock::now() + std::chrono::milliseconds(jobTimeoutMs);
@@ -583,7 +593,8 @@ Outcome run(const Op& op, int jobTimeoutMs, Fault fault)
             if (std::chrono::steady_clock::now() > end)
             {
                 o.answer = "job-stuck";
-                o.detail = job + " still runs after " + std::to_string(jobTimeoutMs) + " ms";
+                o.detail = (job.empty() ? "a job" : job) + " still runs after " +
+                           std::to_string(jobTimeoutMs) + " ms";
                 return o;
             }
             std::this_thread::sleep_for(std::chrono::milliseconds(pause));
@@ -634,6 +645,89 @@ Outcome run(const Op& op, int jobTimeoutMs, Fault fault)
     o.answer = rcAnswer(r.rc);
     o.detail = r.message;
     return o;
+}
+
+size_t objectsLeft(int waitMs)
+{
+    ch::Host& h = host();
+    for (int waited = 0; h.live_objects() != 0 && waited < waitMs; waited += 10)
+        std::this_thread::sleep_for(std::chrono::milliseconds(10));
+    return h.live_objects();
+}
+
+Watchdog::Watchdog(int seconds) : _seconds(seconds), _thread([this] { watch(); })
+{
+}
+
+Watchdog::~Watchdog()
+{
+    {
+        std::lock_guard<std::mutex> g(_mutex);
+        _stop = true;
+    }
+    _cv.notify_all();
+    _thread.join();
+}
+
+void Watchdog::start(const std::string& what)
+{
+    std::lock_guard<std::mutex> g(_mutex);
+    _what = what;
+    _since = std::chrono::steady_clock::now();
+    _busy = true;
+}
+
+void Watchdog::done()
+{
+    std::lock_guard<std::mutex> g(_mutex);
+    _busy = false;
+}
+
+void Watchdog::watch()
+{
+    std::unique_lock<std::mutex> g(_mutex);
+    while (!_stop)
+    {
+        _cv.wait_for(g, std::chrono::seconds(1));
+        if (_busy &&
+            std::chrono::steady_clock::now() - _since > std::chrono::seconds(_seconds))
+        {
+            fprintf(stderr, "FAIL hang: %s took more than %d s; the threads:\n", _what.c_str(),
+                    _seconds);
+            dumpThreads();
+            fflush(stderr);
+            abort();
+        }
+    }
+}
+
+void dumpThreads()
+{
+    char command[128];
+    snprintf(command, sizeof(command),
+             "gdb -p %d -batch -nx -ex 'thread apply all bt' 1>&2 2>/dev/null", int(getpid()));
+    if (system(command) != 0)
+        fprintf(stderr, "(no gdb to show the threads)\n");
+}
+
+std::vector<size_t> shareOf(const std::vector<size_t>& costs, int group, int groups)
+{
+    std::vector<size_t> order(costs.size());
+    for (size_t i = 0; i < order.size(); i++)
+        order[i] = i;
+    std::stable_sort(order.begin(), order.end(),
+                     [&](size_t a, size_t b) { return costs[a] > costs[b]; });
+    std::vector<size_t> load(size_t(groups > 0 ? groups : 1), 0);
+    std::vector<size_t> mine;
+    for (size_t i : order)
+    {
+        size_t g = size_t(std::min_element(load.begin(), load.end()) - load.begin());
+        load[g] += costs[i];
+        if (int(g) == group)
+            mine.push_back(i);
+    }
+    std::sort(mine.begin(), mine.end());
+    return mine;
 }
 
 } // namespace harden

@@ -6,8 +6,13 @@
 
 #include <json/json.h>
 
+#include <chrono>
+#include <condition_variable>
+#include <functional>
+#include <mutex>
 #include <set>
 #include <string>
+#include <thread>
 #include <vector>
 
 #include "cimhost.h"
@@ -102,10 +107,50 @@ struct Fault
 // Runs one operation; a diagnostic test started by it is waited for, at
 // most `jobTimeoutMs`. The job list the wait reads comes from the library
 // too, so `fault`, which the operation runs under, is lifted for each look.
-Outcome run(const Op& op, int jobTimeoutMs = 20000, Fault fault = Fault());
+// `started`, if given, is called once the operation itself has returned,
+// before any waiting.
+Outcome run(const Op& op, int jobTimeoutMs = 20000, Fault fault = Fault(),
+            const std::function<void()>& started = nullptr);
+
+// The CMPI objects left in the global scope once the threads that the last
+// operation started have let theirs go (a test's thread ends a moment after
+// its job), waiting at most `waitMs` for them.
+size_t objectsLeft(int waitMs = 2000);
 
 // One executeMethod, the response text.
 std::string console(const std::string& request, CMPIrc* rc = nullptr);
+
+// Fails the process, with the work under way and every thread's stack, when
+// a piece of work doesn't end in time: a hang ends a run instead of holding
+// it up.
+class Watchdog
+{
+public:
+    explicit Watchdog(int seconds);
+    ~Watchdog();
+    void start(const std::string& what);
+    void done();
+
+private:
+    void watch();
+
+    int _seconds;
+    std::mutex _mutex;
+    std::condition_variable _cv;
+    bool _stop = false;
+    bool _busy = false;
+    std::string _what;
+    std::chrono::steady_clock::time_point _since;
+    std::thread _thread;
+};
+
+// Every thread's stack, from gdb if it is there, on standard error.
+void dumpThreads();
+
+// The share `group` (from 0) of `groups` of items of these costs: the
+// costliest first, each to the share with the least so far, so that the
+// shares take about as long. The places of its items, in their order.
+std::vector<size_t> shareOf(const std::vector<size_t>& costs, int group, int groups);
 
 } // namespace harden
 

@@ -88,60 +88,6 @@ void fail(const std::string& line)
 // A run that takes longer than this has hung.
 const int HANG_SECONDS = 120;
 
-// Fails the process with the operation under way when one doesn't end.
-class Watchdog
-{
-public:
-    Watchdog() : _thread([this] { watch(); }) {}
-    ~Watchdog()
-    {
-        {
-            std::lock_guard<std::mutex> g(_mutex);
-            _stop = true;
-        }
-        _cv.notify_all();
-        _thread.join();
-    }
-    void start(const std::string& what)
-    {
-        std::lock_guard<std::mutex> g(_mutex);
-        _what = what;
-        _since = std::chrono::steady_clock::now();
-        _busy = true;
-    }
-    void done()
-    {
-        std::lock_guard<std::mutex> g(_mutex);
-        _busy = false;
-    }
-
-private:
-    void watch()
-    {
-        std::unique_lock<std::mutex> g(_mutex);
-        while (!_stop)
-        {
-            _cv.wait_for(g, std::chrono::seconds(1));
-            if (_busy && std::chrono::steady_clock::now() - _since >
-                             std::chrono::seconds(HANG_SECONDS))
-            {
-                fprintf(stderr, "FAIL hang: %s took more than %d s\n", _what.c_str(),
-                        HANG_SECONDS);
-                fflush(stderr);
-                abort();
-            }
-        }
-    }
-
-    std::mutex _mutex;
-    std::condition_variable _cv;
-    bool _stop = false;
-    bool _busy = false;
-    std::string _what;
-    std::chrono::steady_clock::time_point _since;
-    std::thread _thread;
-};
-
 //
 // Load and unload, in child processes.
 //
@@ -252,7 +198,7 @@ void loadWithFault(int fd, const char* entry, const char* fault)
         fprintf(stderr, "executeMethod: %s %s\n", ch::rc_name(rc).c_str(), text.c_str());
         exit(3);
     }
-    if (h.live_objects() != 0)
+    if (objectsLeft() != 0)
     {
         fprintf(stderr, "%zu CMPI objects left\n", h.live_objects());
         exit(3);
@@ -518,7 +464,7 @@ int main(int argc, char** argv)
     }
 
     ch::Host& h = host();
-    Watchdog watchdog;
+    Watchdog watchdog(HANG_SECONDS);
     std::vector<Op> ops = operations();
     std::vector<Outcome> healthy(ops.size());
     for (size_t i = 0; i < ops.size(); i++)
@@ -533,7 +479,7 @@ int main(int argc, char** argv)
             reach.byEntry[e].push_back(i);
         if (full)
             fail(ops[i].name + ": the call log overflowed; some entries may be missing");
-        if (h.live_objects() != 0)
+        if (objectsLeft() != 0)
             fail(ops[i].name + ": " + std::to_string(h.live_objects()) +
                  " CMPI objects left after a healthy run");
     }
@@ -572,22 +518,12 @@ int main(int argc, char** argv)
         if (onlyEntries.empty() ||
             std::find(onlyEntries.begin(), onlyEntries.end(), e) != onlyEntries.end())
             entries.push_back(e);
+    std::vector<size_t> costs;
+    for (const std::string& e : entries)
+        costs.push_back(reach.byEntry[e].size() * 4 + (atLoad.count(e) ? 30 : 0) + 1);
     std::vector<std::string> mine;
-    {
-        std::vector<std::pair<size_t, std::string>> byCost;
-        for (const std::string& e : entries)
-            byCost.push_back({reach.byEntry[e].size() * 4 + (atLoad.count(e) ? 30 : 0) + 1, e});
-        std::stable_sort(byCost.begin(), byCost.end(),
-                         [](const auto& a, const auto& b) { return a.first > b.first; });
-        std::vector<size_t> load(size_t(groups), 0);
-        for (const auto& c : byCost)
-        {
-            size_t g = size_t(std::min_element(load.begin(), load.end()) - load.begin());
-            load[g] += c.first;
-            if (int(g) == group)
-                mine.push_back(c.second);
-        }
-    }
+    for (size_t i : shareOf(costs, group, groups))
+        mine.push_back(entries[i]);
 
     std::vector<Row> rows;
     std::vector<std::string> unreached;
@@ -642,7 +578,7 @@ int main(int argc, char** argv)
                     fail(entry + " " + kind->name + ": " + op.name + ": expected " + expected +
                          ", got " + o.answer + " (" + std::to_string(o.count) + ") " + o.detail);
                 }
-                if (h.live_objects() != 0)
+                if (objectsLeft() != 0)
                 {
                     cell.wrong++;
                     fail(entry + " " + kind->name + ": " + op.name + ": " +
