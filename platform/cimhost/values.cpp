@@ -427,6 +427,14 @@ std::string key_value_text(const Value& v)
     case CMPI_ref:
     case CMPI_char16: return quote(scalar_text(v));
     case CMPI_boolean: return v.num.boolean ? "TRUE" : "FALSE";
+    case CMPI_real32:
+    case CMPI_real64:
+    {
+        // A real that prints as a whole number would read back as an
+        // integer key.
+        std::string t = scalar_text(v);
+        return t.find_first_not_of("-0123456789") == std::string::npos ? t + ".0" : t;
+    }
     default: return v.is_array() ? quote(v.text()) : scalar_text(v);
     }
 }

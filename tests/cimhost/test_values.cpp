@@ -33,6 +33,13 @@ TEST(CimhostPathText, ParsesKeysOfEveryKindAndPrintsThemBack)
     Object_Path again;
     ASSERT_TRUE(parse_path(p.to_string(), again, err));
     EXPECT_TRUE(path_equal(p, again));
+
+    // A real key stays a real, also when its value is whole.
+    ASSERT_TRUE(parse_path("X.R=1.5e3,S=-2.0", p, err)) << err;
+    EXPECT_EQ("X.R=1500.0,S=-2.0", p.to_string());
+    ASSERT_TRUE(parse_path(p.to_string(), again, err));
+    EXPECT_EQ(CMPI_real64, again.key("R")->type);
+    EXPECT_TRUE(path_equal(p, again));
 }
 
 TEST(CimhostPathText, QuotedPathsAreReferencesAndNestWithEscapes)
