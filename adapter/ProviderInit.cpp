@@ -32,6 +32,33 @@ static bool _versionTakesLogCallback(const char* version)
     return version[0] - '0' > 2 && version[2] - '0' > 1 && version[4] - '0' > 0;
 }
 
+// A plain entry of the library, which may throw like any other: nothing may
+// leave the start-up, which runs while the CIM server loads the module, nor
+// the end, which runs while it unloads it or exits. A throw counts as
+// `failed`, after an ERR line that names the entry.
+template<class R, class Call>
+static R _guarded(const char* entry, Call call, R failed)
+{
+    try
+    {
+        return call();
+    }
+    catch (const HbaAgentError& e)
+    {
+        TLOG(LL_ERR, "%s got User exception %d: %s", entry, e.getCode(), e.getMessage().c_str());
+    }
+    catch (const std::exception& e)
+    {
+        TLOG(LL_ERR, "%s got std exception: %s", entry, e.what());
+    }
+    catch (...)
+    {
+        TLOG(LL_ERR, "%s got default exception", entry);
+    }
+
+    return failed;
+}
+
 // Runs init_hba_lib; the library may throw, and nothing may leave here
 // because this runs while the CIM server loads the module.
 static bool _initLibrary(Json::Value& reply)
@@ -69,10 +96,12 @@ ProviderInit::ProviderInit()
 
     setupDLLEntryPoints();
 
-    const char* version = libGetAgtVersion();
+    const char* version = _guarded("libGetAgtVersion",
+        [] { return libGetAgtVersion(); }, (const char*)0);
 
     if (_versionTakesLogCallback(version))
-        libRegisterLogMsgCb(ProviderUtil::logMsg);
+        _guarded("libRegisterLogMsgCb",
+            [] { libRegisterLogMsgCb(ProviderUtil::logMsg); return true; }, false);
 
     if (version)
         TLOG(LL_INFO, "TRUJ Library version: %s", version);
@@ -107,7 +136,8 @@ ProviderInit::ProviderInit()
         return;
     }
 
-    unsigned int count = libGetNumOfAdapters();
+    unsigned int count = _guarded("libGetNumOfAdapters",
+        [] { return libGetNumOfAdapters(); }, 0u);
     TLOG(LL_DBG, "Adapter Count = %d\n", (int)count);
 
     driverStatus = count != 0 ? 0 : 1;
@@ -117,15 +147,7 @@ ProviderInit::~ProviderInit()
 {
     TLOG(LL_DBG, "Inside ProviderInit Destructor.");
 
-    // Runs at unload or exit: an exception here would end the process.
-    try
-    {
-        libFreeHbaLib();
-    }
-    catch (...)
-    {
-        TLOG(LL_ERR, "libFreeHbaLib got an exception at unload");
-    }
+    _guarded("libFreeHbaLib", [] { return libFreeHbaLib(); }, -1);
 }
 
 int ProviderInit::getDriverStatus()

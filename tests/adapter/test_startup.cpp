@@ -191,6 +191,36 @@ TEST(Startup, InitFailuresStillLoadTheModule)
     }
 }
 
+// The plain entries throw like the others: the module still loads and
+// unloads, and the ERR line names the entry.
+TEST(Startup, PlainEntriesThatThrowStillLoadAndUnload)
+{
+    struct { const char* entry; const char* kind; const char* status; const char* line; } cases[] = {
+        { "get_agt_version", "hba", "0", "libGetAgtVersion got User exception 1: injected fault" },
+        { "get_agt_version", "unknown", "0", "libGetAgtVersion got default exception" },
+        { "registerLogMsgCb", "std", "0", "libRegisterLogMsgCb got std exception: injected fault" },
+        { "getNumberOfAdapters", "hba", "1", "libGetNumOfAdapters got User exception" },
+        { "free_hba_lib", "unknown", "0", "libFreeHbaLib got default exception" },
+    };
+
+    for (auto& c : cases)
+    {
+        // Faults of the entries called after init_hba_lib come from the
+        // host description it reads.
+        Json::Value host;
+        ASSERT_TRUE(Json::Reader().parse(readFile(DEFAULT_HOST), host));
+        host["faults"][c.entry] = c.kind;
+        std::string path = makeHome() + "/faulty.json";
+        writeFile(path, Json::FastWriter().write(host));
+
+        ProbeRun run = runProbe(DTRUJ_DIR, {"DTRUJ_HOST=" + path},
+            std::string(c.entry) + "=" + c.kind);
+        EXPECT_EQ(c.status, run.report["driverStatus"]) << c.entry;
+        EXPECT_EQ(1u, countLines(run.log, {"ERR: ", c.line})) << c.entry << run.log;
+        EXPECT_EQ(1u, errLines(run.log)) << c.entry << run.log;
+    }
+}
+
 TEST(Startup, InitReplyAndVersionRules)
 {
     // The fake library: its version, init reply and count from the
