@@ -92,11 +92,12 @@ const int HANG_SECONDS = 120;
 // Load and unload, in child processes.
 //
 
-// Runs `body` in a child process that loads the module afresh, and gives
-// back what the child wrote to its pipe; false, with the reason, if it
-// crashed, hung or failed.
-bool inChild(void (*body)(int fd, const char* entry, const char* fault), const char* entry,
-             const char* fault, std::string& out, std::string& why)
+// Runs this program again as a child that loads the module afresh under
+// the fault (none without an entry), and gives back what the child wrote
+// to its pipe; false, with the reason, if it crashed, hung or failed. A
+// new program, not a fork: the module must load into a clean process, not
+// a copy of one whose other threads held locks.
+bool inChild(const char* entry, const char* fault, std::string& out, std::string& why)
 {
     int fds[2];
     if (pipe(fds) != 0)
@@ -106,13 +107,15 @@ bool inChild(void (*body)(int fd, const char* entry, const char* fault), const c
     }
     fflush(stdout);
     fflush(stderr);
+    std::string fd = std::to_string(fds[1]);
     pid_t pid = fork();
     if (pid == 0)
     {
         close(fds[0]);
         alarm(HANG_SECONDS);
-        body(fds[1], entry, fault);
-        exit(0);
+        const char* args[] = {"harden_sweep", "--load-child", fd.c_str(), entry, fault, nullptr};
+        execv("/proc/self/exe", const_cast<char* const*>(args));
+        _exit(127);
     }
     close(fds[1]);
     char buf[4096];
@@ -407,6 +410,13 @@ void printMatrix(const std::vector<Row>& rows, const std::vector<const Kind*>& k
 
 int main(int argc, char** argv)
 {
+    // A child that loads the module: --load-child FD [ENTRY KIND].
+    if (argc >= 3 && std::string(argv[1]) == "--load-child")
+    {
+        loadWithFault(atoi(argv[2]), argc >= 5 ? argv[3] : nullptr, argc >= 5 ? argv[4] : nullptr);
+        return 0;
+    }
+
     std::vector<std::string> onlyEntries;
     std::vector<const Kind*> kinds;
     int group = 0, groups = 1;
@@ -453,7 +463,7 @@ int main(int argc, char** argv)
     Reach reach;
     {
         std::string out, why;
-        if (!inChild(loadWithFault, nullptr, nullptr, out, why))
+        if (!inChild(nullptr, nullptr, out, why))
         {
             fprintf(stderr, "the module doesn't load and unload cleanly: %s\n", why.c_str());
             return 2;
@@ -548,7 +558,7 @@ int main(int argc, char** argv)
             if (row.load)
             {
                 std::string out, why;
-                if (inChild(loadWithFault, entry.c_str(), kind->fault, out, why))
+                if (inChild(entry.c_str(), kind->fault, out, why))
                     cell.answers["o"]++;
                 else
                 {
