@@ -101,7 +101,12 @@ std::string writeQuickHost()
     }
     std::string path = dir().path + "/quick-host.json";
     writeFile(path, Json::StyledWriter().write(h));
-    writeFile(dir().path + "/image.bin", "version=9.9.9.9\nfirmware image\n");
+    // The image of the first adapter's own version: an update changes
+    // nothing a request running beside it could see, such as the key of
+    // its product.
+    writeFile(dir().path + "/image.bin",
+              "version=" + h["adapters"][0]["firmware"]["version"].asString() +
+                  "\nfirmware image\n");
     return path;
 }
 
