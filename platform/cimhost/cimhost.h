@@ -186,6 +186,12 @@ struct Options
     // back give their instances as OpenPegasus does: state CMPI_nullValue,
     // with a valid value.inst.
     bool pegasus_enumerations = false;
+    // How many released objects a scope that never ends (a provider's
+    // long-lived thread, the host's own) keeps poisoned, for a use after
+    // release to be caught; beyond that the oldest are freed. Each costs a
+    // little memory, so a run that measures the provider's memory over a
+    // long time keeps fewer.
+    size_t released_kept = 100000;
     // The "CMPIPrincipal" entry of every context.
     std::string principal = "cimhost";
     // The classes the host knows, as a server knows those compiled into its

@@ -1016,6 +1016,7 @@ Host_Impl::Host_Impl(const Options& o) : opts(o)
         opts.module_path = default_path(CIMHOST_DEFAULT_MODULE);
     if (opts.reg_path.empty())
         opts.reg_path = default_path(CIMHOST_DEFAULT_REG);
+    set_released_kept(opts.released_kept);
 
     memset(&bft, 0, sizeof(bft));
     bft.brokerCapabilities = CMPI_MB_Class_0 | CMPI_MB_Supports_IndicationMI |

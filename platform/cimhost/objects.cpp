@@ -20,7 +20,7 @@ thread_local std::vector<Arena*> arenas;
 
 // Released objects are kept poisoned until their scope ends; a scope that
 // never ends (a long-lived provider thread) forgets the oldest beyond this.
-const size_t MAX_HUSKS = 100000;
+std::atomic<size_t> max_husks {100000};
 
 void link(Obj* o, Arena* a)
 {
@@ -77,7 +77,7 @@ Obj* bury(Obj* o)
         a->oldest_husk = o;
     a->husks = o;
     a->husk_count++;
-    if (a->husk_count <= MAX_HUSKS)
+    if (a->husk_count <= max_husks.load(std::memory_order_relaxed))
         return nullptr;
     Obj* old = a->oldest_husk;
     unlink_husk(old);
@@ -1215,6 +1215,11 @@ Value resolve_at(const Held& h, const Where& where, int depth)
 }
 
 } // namespace
+
+void set_released_kept(size_t n)
+{
+    max_husks = n ? n : 1;
+}
 
 Broker_Faults& broker_faults()
 {

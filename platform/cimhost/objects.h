@@ -171,6 +171,9 @@ size_t live_object_count();
 // What each live object is, newest first in each arena.
 std::vector<std::string> live_object_descriptions();
 
+// How many released objects a scope that doesn't end keeps poisoned.
+void set_released_kept(size_t n);
+
 // Poisons an object of ours; false if it isn't one. Releasing one twice
 // aborts.
 bool release_obj(const void* cmpi);

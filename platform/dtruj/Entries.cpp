@@ -942,6 +942,17 @@ namespace {
 
 const int FLASH_DEFAULT_MS = 1000;
 
+// The update log keeps the latest attempts: a process that lives long (a CIM
+// server) may see many.
+const size_t UPDATE_LOG_LINES = 100;
+
+void noteUpdate(State& s, const std::string& line)
+{
+    s.updateLog.push_back(line);
+    if (s.updateLog.size() > UPDATE_LOG_LINES)
+        s.updateLog.erase(s.updateLog.begin());
+}
+
 // The version an image names in a line "version=<text>" near its start, or
 // "" if none. Only the start is read: an image is large and mostly binary.
 std::string imageVersion(std::ifstream& in)
@@ -985,13 +996,13 @@ Json::Value prepFlash(State& s, const Json::Value& req, FlashJob& job)
     if (file.empty() || !in || stat(file.c_str(), &st) != 0 || !S_ISREG(st.st_mode)) {
         r["status"] = 2;
         r["message"] = "Cannot open image file " + file;
-        s.updateLog.push_back(index + ": " + r["message"].asString());
+        noteUpdate(s, index + ": " + r["message"].asString());
         return r;
     }
     if (s.flashing.count(index)) {
         r["status"] = 3;
         r["message"] = "A flash update of this adapter is already running";
-        s.updateLog.push_back(index + ": " + r["message"].asString());
+        noteUpdate(s, index + ": " + r["message"].asString());
         return r;
     }
     const Json::Value& fl = ro(*a)["flash"];
@@ -1053,7 +1064,7 @@ static Json::Value updateFlash(const Json::Value& req)
     Json::Value* a = findAdapter(s, job.adapter);
     if (a && !job.version.empty())
         (*a)["firmware"]["version"] = job.version;
-    s.updateLog.push_back(job.adapter + ": " + reply["message"].asString());
+    noteUpdate(s, job.adapter + ": " + reply["message"].asString());
     SIMLOG(SL_INFO, "%s: %s", job.adapter.c_str(), reply["message"].asString().c_str());
     return reply;
 }

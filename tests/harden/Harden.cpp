@@ -205,7 +205,7 @@ const std::string& workDir()
     return dir().path;
 }
 
-ch::Host& host(const char* logLevel)
+ch::Host& host(const char* logLevel, size_t releasedKept)
 {
     static ch::Host* h = nullptr;
     if (!h)
@@ -217,7 +217,9 @@ ch::Host& host(const char* logLevel)
         setenv("DTRUJ_HOST", writeQuickHost().c_str(), 1);
         fast_clock::setDivisor(50);
         // Never freed: the module's threads may outlive main()'s locals.
-        h = new ch::Host(ch::Options());
+        ch::Options options;
+        options.released_kept = releasedKept;
+        h = new ch::Host(options);
         if (!h->ok())
         {
             fprintf(stderr, "harden: the stand-in can't load the module: %s\n",

@@ -36,7 +36,8 @@ namespace ch = OLMA::cimhost;
 // the directory),
 // the default host with short test, flash and settle times in its own
 // description, and one stand-in server with the module loaded.
-ch::Host& host(const char* logLevel = "ERR");
+// `releasedKept` as in cimhost's Options.
+ch::Host& host(const char* logLevel = "ERR", size_t releasedKept = 100000);
 const std::string& workDir();
 
 // The simulated library back to the quick host: faults, calls and changes
