@@ -102,6 +102,7 @@ Array<Instance*> FCHBAManager::_serve(classId_t id)
 
 Array<Instance*> FCHBAManager::getInstances(classId_t id)
 {
+    HostInfoScope hostInfo;
     ProviderUtil* util = ProviderUtil::getProviderUtil();
 
     TLOG(LL_INFO, "Requested classId : %d", (int)id);
@@ -153,6 +154,58 @@ Array<Instance*> FCHBAManager::getInstances(classId_t id)
             TLOG(LL_INFO, "Requested class is NOT supported.");
             return Array<Instance*>();
     }
+}
+
+Instance* FCHBAManager::getInstance(classId_t id, const Instance* model)
+{
+    HostInfoScope hostInfo;
+
+    switch (id)
+    {
+        case ID_VESPERA_FCPort:
+        case ID_VESPERA_SCSIProtocolEndpoint:
+        case ID_VESPERA_FCPortStatistics:
+        case ID_VESPERA_AlarmDevice:
+        case ID_VESPERA_PhysicalConnector:
+            break;
+
+        default:
+            return firstWithKeys(getInstances(id), model);
+    }
+
+    TLOG(LL_INFO, "Requested classId : %d", (int)id);
+    TLOG(LL_INFO, "Requested class is: %s",
+        ProviderUtil::getProviderUtil()->getClassName(id).c_str());
+
+    if (!ProviderUtil::getDriverStatus())
+    {
+        TLOG(LL_ERR, "Driver is not installed or there is a trul "
+            "mismatch hence no instances returned");
+        return 0;
+    }
+
+    if (id == ID_VESPERA_PhysicalConnector)
+        return physicalAssetHelper->getInstanceByKeys(id, model);
+
+    return portHelper->getInstanceByKeys(id, model);
+}
+
+Instance* firstWithKeys(Array<Instance*> instances, const Instance* model)
+{
+    Instance* match = 0;
+
+    for (size_t i = 0; i < instances.size(); i++)
+    {
+        if (!instances[i])
+            continue;
+
+        if (!match && model && key_eq(model, instances[i]))
+            match = instances[i];
+        else
+            destroy(instances[i]);
+    }
+
+    return match;
 }
 
 Array<Instance*> FCHBAManager::getFCPortInstancesByAdapter(String address)

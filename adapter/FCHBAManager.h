@@ -32,6 +32,13 @@ public:
 
     Array<Instance*> getInstances(classId_t id);
 
+    // The one instance of a class whose keys model holds, as getInstances
+    // would give it (the first whose keys match); null if it gives none.
+    // FC ports, their statistics, endpoints and alarms and the connectors
+    // are looked up directly, the other classes among their instances. The
+    // caller owns the instance.
+    Instance* getInstance(classId_t id, const Instance* model);
+
     Array<Instance*> getFCPortInstancesByAdapter(String address);
     Array<Instance*> getEthernetPortInstancesByAdapter(String address);
 
@@ -63,6 +70,10 @@ private:
 };
 
 extern FCHBAManager gFCHBAManagerObj;
+
+// The first of instances whose keys model holds; the others are destroyed.
+// Null if none matches.
+Instance* firstWithKeys(Array<Instance*> instances, const Instance* model);
 
 } // namespace OLMA
 

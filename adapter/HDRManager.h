@@ -23,6 +23,12 @@ public:
 
     Array<Instance*> getInstances(classId_t id);
 
+    // The one storage extent, tape drive or logical disk whose keys model
+    // holds, as getInstances would give it; null if it gives none. Only the
+    // port and remote port that its DeviceID names are read. The caller
+    // owns the instance.
+    Instance* getInstance(classId_t id, const Instance* model);
+
     static HDRManager* helperObj;
 
     // Walks the ports and asks its TargetHelper for what lies behind each.

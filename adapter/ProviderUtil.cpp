@@ -1,7 +1,9 @@
 #include "ProviderUtil.h"
 #include "EthernetPortHelper.h"
 
+#include <dirent.h>
 #include <errno.h>
+#include <fcntl.h>
 #include <netdb.h>
 #include <arpa/inet.h>
 #include <ctype.h>
@@ -216,14 +218,23 @@ static bool _lookUpHost(const char* name, struct hostent& entry,
     }
 }
 
+// As strncpy: at most size bytes, the rest of them zero, no terminator
+// added when the text fills them all.
 static void _copyOut(char* to, const char* from, int size)
 {
-    if (to && size > 0)
-        strncpy(to, from, size);
+    if (!to || size <= 0)
+        return;
+    size_t n = strnlen(from, (size_t)size);
+    memcpy(to, from, n);
+    memset(to + n, 0, (size_t)size - n);
 }
 
-int ProviderUtil::getHostInfo(char* hostString, int size)
+// The host facts as getHostInfo tells them; copied reports whether
+// hostString was written at all.
+static int _readHostInfo(char* hostString, int size, bool& copied)
 {
+    copied = true;
+
     char hostName[255];
     memset(hostName, 0, sizeof(hostName));
 
@@ -267,6 +278,7 @@ int ProviderUtil::getHostInfo(char* hostString, int size)
     if (gethostname(hostName, sizeof(hostName) - 1) != 0)
     {
         TLOG(LL_INFO, "gethostname() failed");
+        copied = false;
         return 2;
     }
 
@@ -286,21 +298,106 @@ int ProviderUtil::getHostInfo(char* hostString, int size)
     return 2;
 }
 
+namespace
+{
+
+// The host facts of the request that runs on this thread, while a
+// HostInfoScope is open: a walk asks for them per adapter and per port,
+// and each answer costs system calls and a read of the host tables.
+struct Host_Info_Cache
+{
+    int depth;
+    bool filled;
+    bool copied;
+    int code;
+    char host[256];
+};
+
+thread_local Host_Info_Cache _hostInfoCache;
+
+} // namespace
+
+HostInfoScope::HostInfoScope()
+{
+    if (_hostInfoCache.depth++ == 0)
+        _hostInfoCache.filled = false;
+}
+
+HostInfoScope::~HostInfoScope()
+{
+    if (--_hostInfoCache.depth == 0)
+        _hostInfoCache.filled = false;
+}
+
+int ProviderUtil::getHostInfo(char* hostString, int size)
+{
+    Host_Info_Cache& cache = _hostInfoCache;
+
+    if (cache.depth == 0)
+    {
+        bool copied;
+        return _readHostInfo(hostString, size, copied);
+    }
+
+    if (!cache.filled)
+    {
+        memset(cache.host, 0, sizeof(cache.host));
+        cache.code = _readHostInfo(cache.host, (int)sizeof(cache.host) - 1, cache.copied);
+        cache.filled = true;
+    }
+
+    if (cache.copied)
+        _copyOut(hostString, cache.host, size);
+
+    return cache.code;
+}
+
+// Whether a process whose name ends in name runs: the process list as
+// "ps -e | grep name$" would see it, read from /proc without a shell.
+static bool _processRuns(const char* name)
+{
+    DIR* proc = opendir("/proc");
+
+    if (!proc)
+        return false;
+
+    size_t want = strlen(name);
+    bool found = false;
+    struct dirent* e;
+
+    while (!found && (e = readdir(proc)) != 0)
+    {
+        if (e->d_name[0] < '1' || e->d_name[0] > '9')
+            continue;
+
+        char path[64];
+        snprintf(path, sizeof(path), "/proc/%.20s/comm", e->d_name);
+
+        int fd = open(path, O_RDONLY | O_CLOEXEC);
+
+        if (fd < 0)
+            continue;
+
+        char comm[64];
+        ssize_t n = read(fd, comm, sizeof(comm) - 1);
+        close(fd);
+
+        if (n <= 0)
+            continue;
+
+        while (n > 0 && comm[n - 1] == '\n')
+            n--;
+
+        found = (size_t)n >= want && memcmp(comm + n - want, name, want) == 0;
+    }
+
+    closedir(proc);
+    return found;
+}
+
 unsigned int ProviderUtil::getAgentPort()
 {
-    FILE* pipe = popen("ps -e | grep zarkagent$", "r");
-
-    if (!pipe)
-        return 0;
-
-    char line[128];
-    unsigned int port = 0;
-
-    if (fgets(line, sizeof(line), pipe) && line[0] != '\0')
-        port = 34568;
-
-    pclose(pipe);
-    return port;
+    return _processRuns("zarkagent") ? 34568 : 0;
 }
 
 String ProviderUtil::updateNamespacePath(String className)
@@ -495,7 +592,16 @@ String ProviderUtil::getClassName(classId_t id)
         return String("INVALID CLASS");
     }
 
-    return String(classNames[id]);
+    // Built once: every instance of a walk names its class and the host's,
+    // and a copy of a built String only counts a reference.
+    static const String* names = [] {
+        static String all[MAXCLASSID + 1];
+        for (int i = 0; i <= MAXCLASSID; i++)
+            all[i] = String(classNames[i]);
+        return all;
+    }();
+
+    return names[id];
 }
 
 String ProviderUtil::getDiagTestName(diag_test_id_t id)

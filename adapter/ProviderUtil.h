@@ -16,6 +16,21 @@ namespace OLMA
 // Addresses come in two forms: the colon form the library speaks
 // ("10:00:00:05:1e:0f:ab:01", 23 characters; MACs 17) and the plain form of
 // CIM keys ("1000000051e0fab01", 16 digits; MACs 12). Letter case is kept.
+// While one is open on a thread, getHostInfo answers from what it found
+// the first time: a request asks for the host facts once, however many
+// adapters and ports its walk reads. Scopes nest; the outermost one ends
+// the request's view.
+class HostInfoScope
+{
+public:
+    HostInfoScope();
+    ~HostInfoScope();
+
+private:
+    HostInfoScope(const HostInfoScope&);
+    HostInfoScope& operator=(const HostInfoScope&);
+};
+
 class ProviderUtil
 {
 public:
@@ -27,7 +42,9 @@ public:
 
     // Fills hostString (zeroed by the caller, at most size bytes) with the
     // host's first non-loopback IPv4 address (returns 0), its host name
-    // (returns 2) or "localhost" (returns 3).
+    // (returns 2) or "localhost" (returns 3). Within a HostInfoScope the
+    // host is looked at once.
+
     int getHostInfo(char* hostString, int size);
 
     // Plain-form WWN (16 digits) or MAC (12 digits) to raw bytes. Bytes that
@@ -63,7 +80,8 @@ public:
     // with '-'.
     static bool isSafeRelativePath(const char* path);
 
-    // 34568 if the console agent (zarkagent) runs, else 0.
+    // 34568 if the console agent (zarkagent) runs, else 0. The process list
+    // is read from /proc.
     unsigned int getAgentPort();
 
     // False only for the statuses "driver not installed" (2) and "library

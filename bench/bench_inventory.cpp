@@ -1,6 +1,10 @@
 // bench_inventory: how fast the inventory classes enumerate on a large host,
 // through the stand-in CIM server, and how much memory the run takes at
-// its peak.
+// its peak. Beside the time of one enumeration it shows the adapter
+// library's calls and time in it (the simulator's counters), what the
+// module and the stand-in took per instance beyond that, and the time of a
+// getInstance of the instance in the middle. bench_model shows the module's
+// own share without the stand-in.
 //
 //   bench_inventory [--host FILE] [--seconds S]
 //
@@ -89,11 +93,32 @@ int main(int argc, char** argv)
 
     // The module opens the library by its bare name; once loaded, that name
     // finds this copy.
-    if (!dlopen(VSPR_DTRUJ_PATH, RTLD_NOW | RTLD_GLOBAL))
+    void* dtruj = dlopen(VSPR_DTRUJ_PATH, RTLD_NOW | RTLD_GLOBAL);
+    if (!dtruj)
     {
         fprintf(stderr, "bench_inventory: %s\n", dlerror());
         return 1;
     }
+    typedef char* (*Counters)(int);
+    Counters counters = (Counters)dlsym(dtruj, "dtruj_sim_counters");
+    // Calls and seconds spent in the library since the last look.
+    auto library = [counters](double& seconds) {
+        unsigned long long calls = 0;
+        seconds = 0;
+        char* text = counters ? counters(1) : nullptr;
+        for (const char* p = text; p && (p = strstr(p, "\"calls\":")); )
+        {
+            unsigned long long c = 0, ns = 0;
+            if (sscanf(p, "\"calls\":%llu,\"ns\":%llu", &c, &ns) == 2)
+            {
+                calls += c;
+                seconds += ns / 1e9;
+            }
+            p += 8;
+        }
+        free(text);
+        return calls;
+    };
 
     int status = 0;
     {
@@ -105,8 +130,8 @@ int main(int argc, char** argv)
         }
 
         printf("host: %s\n", hostFile.c_str());
-        printf("%-34s %10s %6s %12s %14s\n", "class", "instances", "runs", "ms/run",
-            "instances/s");
+        printf("%-34s %9s %5s %10s %10s %9s %12s %9s\n", "class", "instances", "runs",
+            "ms/run", "lib calls", "lib ms", "rest us/i", "gi ms");
 
         for (const char* cls : classes)
         {
@@ -117,10 +142,16 @@ int main(int argc, char** argv)
             size_t count = 0;
             int runs = 0;
             double seconds = 0;
+            double libSeconds = 0;
+            unsigned long long libCalls = 0;
+            ch::Object_Path middle;
+            library(libSeconds);
             auto start = std::chrono::steady_clock::now();
             do
             {
                 ch::Result r = host.ei(path);
+                if (r.ok() && !r.instances.empty())
+                    middle = r.instances[r.instances.size() / 2].path;
                 if (!r.ok())
                 {
                     fprintf(stderr, "%s: %s\n", cls, ch::rc_name(r.rc).c_str());
@@ -135,8 +166,31 @@ int main(int argc, char** argv)
             while (seconds < minSeconds);
 
             double perRun = runs ? seconds / runs : 0;
-            printf("%-34s %10zu %6d %12.2f %14.0f\n", cls, count, runs, perRun * 1000,
-                perRun > 0 ? count / perRun : 0);
+            libCalls = library(libSeconds);
+            double libPerRun = runs ? libSeconds / runs : 0;
+
+            char gi[32] = "-";
+            if (count)
+            {
+                int n = 0;
+                auto t0 = std::chrono::steady_clock::now();
+                double spent = 0;
+                do
+                {
+                    if (!host.gi(middle).ok())
+                        break;
+                    n++;
+                    spent = std::chrono::duration<double>(
+                        std::chrono::steady_clock::now() - t0).count();
+                }
+                while (spent < minSeconds / 4);
+                if (n)
+                    snprintf(gi, sizeof(gi), "%.3f", spent / n * 1000);
+            }
+
+            printf("%-34s %9zu %5d %10.2f %10.0f %9.2f %12.2f %9s\n", cls, count, runs,
+                perRun * 1000, runs ? (double)libCalls / runs : 0, libPerRun * 1000,
+                count ? (perRun - libPerRun) / count * 1e6 : 0, gi);
             fflush(stdout);
         }
     }

@@ -1274,6 +1274,7 @@ static CMPIrc _references(CMPI_Adapter* adapter, const CMPIContext* context,
     Ref<Instance> model(create(mc, false));
     if (names)
         __set_null_flags(model.ptr(), false, true, 1);
+    __set_name_space_recursive(model.ptr(), _name_space_of(object_path), false);
 
     association::Data data =
         { adapter->broker, context, result, _name_space_of(object_path), properties, 0 };

@@ -236,6 +236,9 @@ Enum_Associator_Names_Status Provider_Handle::enum_associator_names(
 
     Instance* model = create(mc, false);
     __set_null_flags(model, false, true, 1);
+    // A provider learns the request's namespace from its model, as it does
+    // for an enumeration: the module serves some classes in more than one.
+    __set_name_space_recursive(model, instance->__name_space.c_str(), false);
 
     _enum_associator_names::Data data =
         { instance, &result_class, &role, &result_role, proc_, client_data };

@@ -33,6 +33,23 @@ void deliverInstances(Array<Instance*>& instances, Enum_Instances_Handler<T>* ha
     instances.clear();
 }
 
+// Hands the one instance that a look-up found to getInstance's
+// out-parameter, which passes it to the runtime. Nothing, or an instance of
+// another class, is not found.
+template<class T>
+Get_Instance_Status deliverInstance(Instance* found, T*& instance)
+{
+    instance = checked_cast<T>(found);
+
+    if (instance)
+        return GET_INSTANCE_OK;
+
+    if (found)
+        destroy(found);
+
+    return GET_INSTANCE_NOT_FOUND;
+}
+
 // Releases every element of an array that won't be delivered.
 inline void destroyInstances(Array<Instance*>& instances)
 {

@@ -48,6 +48,19 @@ static void _fillSfpInfo(const Json::Value& optics, int adapterId, int portPlace
             adapterId, portPlace, sizeof(sfp.tag) - 1);
 }
 
+// Whether the connector of this adapter and port place can have the tag
+// looked for: it ends in both, unless it is as long as a tag can be and may
+// have lost its end.
+static bool _mayBeTagOf(const _keyLookup& lookup, int adapterId, int place)
+{
+    if (!lookup.key || strlen(lookup.key) >= sizeof(((_sfpInfo*)0)->tag) - 1)
+        return true;
+
+    char ids[32];
+    snprintf(ids, sizeof(ids), "%d_%d", adapterId, place);
+    return lookup.endsWith(ids);
+}
+
 Array<Instance*> PhysicalAssetHelper::getInstancesByClass(classId_t id)
 {
     TLOG(LL_DBG, "Entering: %s", "PhysicalAssetHelper::getInstancesByClass");
@@ -60,6 +73,33 @@ Array<Instance*> PhysicalAssetHelper::getInstancesByClass(classId_t id)
         return result;
     }
 
+    _walk(result, 0);
+
+    TLOG(LL_INFO, "Number of instances: %d", (int)result.size());
+    TLOG(LL_DBG, "Returning: %s", "PhysicalAssetHelper::getInstancesByClass");
+    return result;
+}
+
+Instance* PhysicalAssetHelper::getInstanceByKeys(classId_t id, const Instance* model)
+{
+    _keyLookup lookup;
+
+    if (id != ID_VESPERA_PhysicalConnector)
+    {
+        TLOG(LL_INFO, "Unhandled class support");
+        return 0;
+    }
+
+    if (!_keyLookup::of(id, model, lookup))
+        return 0;
+
+    Array<Instance*> result;
+    _walk(result, &lookup);
+    return result.size() > 0 ? result[0] : 0;
+}
+
+void PhysicalAssetHelper::_walk(Array<Instance*>& result, const _keyLookup* lookup)
+{
     ProviderUtil* util = ProviderUtil::getProviderUtil();
     PortHelper* portHelper = PortHelper::getPortHelperObject();
 
@@ -69,13 +109,13 @@ Array<Instance*> PhysicalAssetHelper::getInstancesByClass(classId_t id)
     if (count < 1)
     {
         TLOG(LL_WARN, "No adapters in the system. ");
-        return result;
+        return;
     }
 
     const Json::Value* list = AdapterHelper::jsonMember(adapters, "indexStrings");
 
     if (!list || !list->isArray())
-        return result;
+        return;
 
     for (int i = 0; i < count; i++)
     {
@@ -112,6 +152,9 @@ Array<Instance*> PhysicalAssetHelper::getInstancesByClass(classId_t id)
             if (!portElement.isString())
                 continue;
 
+            if (lookup && !_mayBeTagOf(*lookup, adapterId, place))
+                continue;
+
             String portIndex(portElement.asCString());
             Json::Value portDetails;
 
@@ -135,12 +178,11 @@ Array<Instance*> PhysicalAssetHelper::getInstancesByClass(classId_t id)
 
             if (instance)
                 result.append(instance);
+
+            if (lookup && lookup->keepMatch(result, result.size() - (instance ? 1 : 0)))
+                return;
         }
     }
-
-    TLOG(LL_INFO, "Number of instances: %d", (int)result.size());
-    TLOG(LL_DBG, "Returning: %s", "PhysicalAssetHelper::getInstancesByClass");
-    return result;
 }
 
 Instance* PhysicalAssetHelper::getPhysicalConnectorInstance(_sfpInfo sfp)

@@ -3,6 +3,7 @@
 
 #include "Array.h"
 #include "Instance.h"
+#include "PortHelper.h"
 #include "ProviderTypes.h"
 
 namespace OLMA
@@ -32,7 +33,16 @@ public:
     // them. Any other id gives none.
     Array<Instance*> getInstancesByClass(classId_t id);
 
+    // The connector whose keys model holds, as the enumeration would give
+    // it; null if it would give none. The caller owns the instance.
+    Instance* getInstanceByKeys(classId_t id, const Instance* model);
+
     Instance* getPhysicalConnectorInstance(_sfpInfo sfp);
+
+private:
+
+    // All connectors, or with a lookup the one it looks for.
+    void _walk(Array<Instance*>& result, const _keyLookup* lookup);
 
     static PhysicalAssetHelper* helperObj;
 };

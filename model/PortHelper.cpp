@@ -14,8 +14,12 @@
 #include "VESPERA_AlarmDevice.h"
 #include "VESPERA_FCPort.h"
 #include "VESPERA_FCPortStatistics.h"
+#include "VESPERA_LogicalDisk.h"
 #include "VESPERA_LogicalPortGroup.h"
+#include "VESPERA_PhysicalConnector.h"
 #include "VESPERA_SCSIProtocolEndpoint.h"
+#include "VESPERA_StorageExtent.h"
+#include "VESPERA_TapeDrive.h"
 
 namespace OLMA
 {
@@ -212,6 +216,13 @@ bool walkServes(classId_t id, bool byAddress)
     }
 }
 
+// The classes of what lies behind a port's remote ports.
+bool walksTargets(classId_t id)
+{
+    return id == ID_VESPERA_StorageExtent || id == ID_VESPERA_TapeDrive ||
+        id == ID_VESPERA_LogicalDisk;
+}
+
 // The group of a node, if the walk built it already. Nodes are one whatever
 // the case their ports spell the WWN in.
 bool hasGroup(const Array<Instance*>& built, const char* nodeWwn)
@@ -278,6 +289,126 @@ const Stat_Id fcoeStatIds[] =
 };
 
 } // namespace
+
+//------------------------------------------------------------------------------
+// Look-ups by keys
+//------------------------------------------------------------------------------
+
+namespace
+{
+
+template<class C>
+const Property<String>* keyOf(const Instance* model, Property<String> C::*key)
+{
+    const C* typed = checked_cast<C>(model);
+    return typed ? &(typed->*key) : 0;
+}
+
+} // namespace
+
+bool _keyLookup::of(classId_t id, const Instance* model, _keyLookup& lookup)
+{
+    lookup.model = model;
+    lookup.key = 0;
+
+    if (!model)
+        return false;
+
+    const Property<String>* key = 0;
+
+    switch (id)
+    {
+        case ID_VESPERA_FCPort:
+            key = keyOf(model, &VESPERA_FCPort::DeviceID);
+            break;
+        case ID_VESPERA_AlarmDevice:
+            key = keyOf(model, &VESPERA_AlarmDevice::DeviceID);
+            break;
+        case ID_VESPERA_FCPortStatistics:
+            key = keyOf(model, &VESPERA_FCPortStatistics::InstanceID);
+            break;
+        case ID_VESPERA_SCSIProtocolEndpoint:
+            key = keyOf(model, &VESPERA_SCSIProtocolEndpoint::Name);
+            break;
+        case ID_VESPERA_StorageExtent:
+            key = keyOf(model, &VESPERA_StorageExtent::DeviceID);
+            break;
+        case ID_VESPERA_TapeDrive:
+            key = keyOf(model, &VESPERA_TapeDrive::DeviceID);
+            break;
+        case ID_VESPERA_LogicalDisk:
+            key = keyOf(model, &VESPERA_LogicalDisk::DeviceID);
+            break;
+        case ID_VESPERA_PhysicalConnector:
+            key = keyOf(model, &VESPERA_PhysicalConnector::Tag);
+            break;
+        default:
+            break;
+    }
+
+    if (!key)
+        return true;
+
+    // Every instance has its keys set: a null one matches none.
+    if (key->null)
+        return false;
+
+    lookup.key = key->value.c_str();
+    return true;
+}
+
+bool _keyLookup::is(const char* text) const
+{
+    return !key || strcmp(key, text) == 0;
+}
+
+bool _keyLookup::isBehind(const char* portWwn, const char* remoteWwn) const
+{
+    if (!key)
+        return true;
+
+    size_t n = strlen(portWwn);
+
+    if (strncmp(key, portWwn, n) != 0 || key[n] != '_')
+        return false;
+
+    if (!remoteWwn)
+        return true;
+
+    const char* rest = key + n + 1;
+    size_t m = strlen(remoteWwn);
+    return strncmp(rest, remoteWwn, m) == 0 && rest[m] == '_';
+}
+
+bool _keyLookup::endsWith(const char* text) const
+{
+    if (!key)
+        return true;
+
+    size_t n = strlen(key);
+    size_t m = strlen(text);
+    return n > m && key[n - m - 1] == '_' && strcmp(key + n - m, text) == 0;
+}
+
+bool _keyLookup::keepMatch(Array<Instance*>& result, size_t from) const
+{
+    Instance* match = 0;
+
+    for (size_t i = from; i < result.size(); i++)
+    {
+        if (!match && result[i] && key_eq(model, result[i]))
+            match = result[i];
+        else if (result[i])
+            destroy(result[i]);
+    }
+
+    result.remove(from, result.size() - from);
+
+    if (match)
+        result.append(match);
+
+    return match != 0;
+}
 
 //------------------------------------------------------------------------------
 // Records
@@ -386,6 +517,7 @@ uint16 PortHelper::getEnabledState(int state)
 
 Array<Instance*> PortHelper::getInstancesByClass(classId_t id)
 {
+    HostInfoScope hostInfo;
     Array<Instance*> result;
 
     if (!walkServes(id, false))
@@ -441,6 +573,7 @@ Array<Instance*> PortHelper::getInstancesByClass(classId_t id)
 Array<Instance*> PortHelper::getInstancesByAdapterId(int adapterId, classId_t id,
     Json::Value adapters)
 {
+    HostInfoScope hostInfo;
     Array<Instance*> result;
 
     if (!walkServes(id, false))
@@ -464,6 +597,7 @@ Array<Instance*> PortHelper::getInstancesByAdapterId(int adapterId, classId_t id
 
 Array<Instance*> PortHelper::getInstancesByAdapterAddress(String address, classId_t id)
 {
+    HostInfoScope hostInfo;
     Array<Instance*> result;
 
     if (!walkServes(id, true))
@@ -487,8 +621,59 @@ Array<Instance*> PortHelper::getFCPortInstancesByAdapter(String address)
     return getInstancesByAdapterAddress(address, ID_VESPERA_FCPort);
 }
 
+Instance* PortHelper::getInstanceByKeys(classId_t id, const Instance* model)
+{
+    if (!walkServes(id, false) || id == ID_VESPERA_LogicalPortGroup)
+    {
+        TLOG(LL_INFO, "Unhandled class support");
+        return 0;
+    }
+
+    _keyLookup lookup;
+
+    if (!_keyLookup::of(id, model, lookup))
+        return 0;
+
+    HostInfoScope hostInfo;
+
+    Json::Value adapters;
+    bool called = callLib("libGetAllAdaptersIndexString", libGetAllAdaptersIndexString,
+        Json::Value(), adapters);
+
+    if (!called || !isGood(adapters) || !member(adapters, "indexStrings").isArray())
+    {
+        TLOG(LL_ERR, "libGetAllAdaptersIndexString returns NULL.");
+        return 0;
+    }
+
+    const Json::Value& list = adapters["indexStrings"];
+
+    if (list.size() == 0)
+    {
+        TLOG(LL_WARN, "No adapters in the system. ");
+        return 0;
+    }
+
+    for (Json::ArrayIndex i = 0; i < list.size(); i++)
+    {
+        if (!list[i].isString())
+        {
+            TLOG(LL_ERR, "No adapter index string at place %d", (int)i + 1);
+            continue;
+        }
+
+        Array<Instance*> found;
+        _walkAdapter(String(list[i].asCString()), id, false, found, &lookup);
+
+        if (found.size() > 0)
+            return found[0];
+    }
+
+    return 0;
+}
+
 bool PortHelper::_walkAdapter(const String& index, classId_t id, bool byAddress,
-    Array<Instance*>& result)
+    Array<Instance*>& result, const _keyLookup* lookup)
 {
     Json::Value request(Json::objectValue);
     request["indexStr"] = index.c_str();
@@ -561,14 +746,34 @@ bool PortHelper::_walkAdapter(const String& index, classId_t id, bool byAddress,
         ProviderUtil::getProviderUtil()->getHostInfo(port.hostName,
             (int)sizeof(port.hostName) - 1);
 
-        _buildForPort(portIndex, reply, port, id, result);
+        if (!lookup)
+        {
+            _buildForPort(portIndex, reply, port, id, result, 0);
+            continue;
+        }
+
+        // What a port holds is named by its WWN: the port itself, or what
+        // lies behind it.
+        bool mayHold = id == ID_VESPERA_SCSIProtocolEndpoint ?
+            lookup->is(port.portWwn) || lookup->isBehind(port.portWwn) :
+            walksTargets(id) ? lookup->isBehind(port.portWwn) : lookup->is(port.portWwn);
+
+        if (!mayHold)
+            continue;
+
+        size_t from = result.size();
+        _buildForPort(portIndex, reply, port, id, result, lookup);
+
+        if (lookup->keepMatch(result, from))
+            break;
     }
 
     return true;
 }
 
 void PortHelper::_buildForPort(const String& portIndex, const Json::Value& reply,
-    const _hbaPortInfo& port, classId_t id, Array<Instance*>& result)
+    const _hbaPortInfo& port, classId_t id, Array<Instance*>& result,
+    const _keyLookup* lookup)
 {
     switch (id)
     {
@@ -599,8 +804,10 @@ void PortHelper::_buildForPort(const String& portIndex, const Json::Value& reply
         }
 
         case ID_VESPERA_SCSIProtocolEndpoint:
-            result.append(getSCSIProtocolEndpointInstance(port, true));
-            _addTargetEndpoints(port, result);
+            if (!lookup || lookup->is(port.portWwn))
+                result.append(getSCSIProtocolEndpointInstance(port, true));
+            if (!lookup || lookup->isBehind(port.portWwn))
+                _addTargetEndpoints(port, result, lookup);
             break;
 
         case ID_VESPERA_FCPortStatistics:
@@ -610,7 +817,7 @@ void PortHelper::_buildForPort(const String& portIndex, const Json::Value& reply
         case ID_VESPERA_StorageExtent:
         case ID_VESPERA_TapeDrive:
         case ID_VESPERA_LogicalDisk:
-            result.append(_targetHelper->getTargetInstances(port, id));
+            result.append(_targetHelper->getTargetInstances(port, id, lookup));
             break;
 
         default:
@@ -619,7 +826,8 @@ void PortHelper::_buildForPort(const String& portIndex, const Json::Value& reply
     }
 }
 
-void PortHelper::_addTargetEndpoints(const _hbaPortInfo& port, Array<Instance*>& result)
+void PortHelper::_addTargetEndpoints(const _hbaPortInfo& port, Array<Instance*>& result,
+    const _keyLookup* lookup)
 {
     Json::Value request(Json::objectValue);
     String wwn = colonForm(port.portWwn);
@@ -650,17 +858,38 @@ void PortHelper::_addTargetEndpoints(const _hbaPortInfo& port, Array<Instance*>&
             continue;
         }
 
-        request["rPortWwn"] = remoteWwn;
+        _hbaPortInfo target = port;
+        copyPlainAddress(target.rPortWwn, sizeof(target.rPortWwn), remoteWwn,
+            "remotePortWwn");
 
+        if (lookup)
+        {
+            String name(port.portWwn, "_", target.rPortWwn);
+
+            if (!lookup->is(name.c_str()))
+                continue;
+        }
+
+        // The list tells what the endpoint needs where it carries the
+        // remote port's device data; only a list without it makes the walk
+        // ask for the whole remote port, with all its logical units.
+        const Json::Value* device = TargetHelper::listedDeviceData(remotePorts[i]);
         Json::Value reply;
 
-        if (!callLib("libGetCompleteRemotePort", libGetCompleteRemotePort, request, reply))
-            continue;
+        if (!device)
+        {
+            request["rPortWwn"] = remoteWwn;
 
-        const Json::Value& device = member(reply, "deviceData");
+            if (!callLib("libGetCompleteRemotePort", libGetCompleteRemotePort, request,
+                reply))
+                continue;
+
+            device = isGood(reply) ? &member(reply, "deviceData") : 0;
+        }
+
         bool isTarget = false;
 
-        if (!isGood(reply) || !boolOf(device, "isTarget", isTarget))
+        if (!device || !boolOf(*device, "isTarget", isTarget))
         {
             TLOG(LL_ERR, "libGetCompleteRemotePort returned NULL for %s", remoteWwn);
             continue;
@@ -669,10 +898,7 @@ void PortHelper::_addTargetEndpoints(const _hbaPortInfo& port, Array<Instance*>&
         if (!isTarget)
             continue;
 
-        _hbaPortInfo target = port;
-        copyPlainAddress(target.rPortWwn, sizeof(target.rPortWwn), remoteWwn,
-            "remotePortWwn");
-        const Json::Value& state = member(device, "stateMofValue");
+        const Json::Value& state = member(*device, "stateMofValue");
         target.state = state.isInt() ? state.asInt() : 0;
 
         result.append(getSCSIProtocolEndpointInstance(target, false));

@@ -14,6 +14,35 @@ namespace OLMA
 
 class TargetHelper;
 
+// A look-up by keys: the model that holds the keys of the one instance a
+// walk looks for, and the key that tells which port's part it can be
+// (DeviceID, Name or InstanceID). Given one, a walk asks the library only
+// for what can hold that instance and stops at the first instance whose
+// keys match, in the order the enumeration would meet it; so the answer is
+// the one the enumeration would give, found without building the others.
+struct _keyLookup
+{
+    const Instance* model;
+    // Null when the model is of a class whose key can't be read here: the
+    // walk then narrows nothing and only key_eq decides.
+    const char* key;
+
+    // The key of model for the class id; false if the model leaves it null,
+    // so that no instance of the class can match.
+    static bool of(classId_t id, const Instance* model, _keyLookup& lookup);
+
+    // Whether the key is exactly text, or begins with the parts joined by
+    // "_" and a further "_" (what lies behind a port or a remote port).
+    bool is(const char* text) const;
+    bool isBehind(const char* portWwn, const char* remoteWwn = 0) const;
+    // Whether the key ends with "_" and the text.
+    bool endsWith(const char* text) const;
+
+    // Keeps the first of result[from...] whose keys match, destroys the
+    // rest; true if one matched.
+    bool keepMatch(Array<Instance*>& result, size_t from) const;
+};
+
 // One physical FC port as read from getPortByWwn. Addresses are in plain
 // form. Zeroed for each port and handed by value to the builders, so a
 // builder can never see a half-filled text of another port.
@@ -111,6 +140,11 @@ public:
 
     Array<Instance*> getFCPortInstancesByAdapter(String address);
 
+    // The one instance of class 3, 4, 5, 9, 16, 36 or 38 whose keys model
+    // holds, as the enumeration of the class would give it; null if it
+    // would give none. The caller owns the instance.
+    Instance* getInstanceByKeys(classId_t id, const Instance* model);
+
     // getPortByWwn of a port (WWN, or a 12-digit MAC); 0 or -1.
     int getPortDetails(String index, Json::Value& reply);
 
@@ -158,11 +192,14 @@ private:
     static void fillPortStatistics(const Json::Value& reply, bool isFCoE,
         prov_pport_stats_s& stats);
 
+    // A lookup makes the walk stop once result holds the instance.
     bool _walkAdapter(const String& index, classId_t id, bool byAddress,
-        Array<Instance*>& result);
+        Array<Instance*>& result, const _keyLookup* lookup = 0);
     void _buildForPort(const String& portIndex, const Json::Value& reply,
-        const _hbaPortInfo& port, classId_t id, Array<Instance*>& result);
-    void _addTargetEndpoints(const _hbaPortInfo& port, Array<Instance*>& result);
+        const _hbaPortInfo& port, classId_t id, Array<Instance*>& result,
+        const _keyLookup* lookup);
+    void _addTargetEndpoints(const _hbaPortInfo& port, Array<Instance*>& result,
+        const _keyLookup* lookup);
     void _addStatistics(const String& portIndex, const Json::Value& reply,
         const _hbaPortInfo& port, Array<Instance*>& result);
 

@@ -86,12 +86,34 @@ bool isTapeLike(const char* type)
     return type && (strcmp(type, "Tape") == 0 || strcmp(type, "Media Changer") == 0);
 }
 
-bool serves(bool tapeLike, classId_t id)
+bool servesKind(bool tapeLike, classId_t id)
 {
     if (tapeLike)
         return id == ID_VESPERA_TapeDrive;
 
     return id == ID_VESPERA_StorageExtent || id == ID_VESPERA_LogicalDisk;
+}
+
+// Whether a remote port of this device data holds units of the class: a
+// target of the kind the class shows. Says why not, as the walk always has.
+bool serves(const Json::Value& device, classId_t id)
+{
+    if (!member(device, "isTarget").asBool())
+    {
+        TLOG(LL_DBG, "Nothing to do since the its not a Target Rport.");
+        return false;
+    }
+
+    const char* type = textOf(device, "type");
+    TLOG(LL_DBG, "Device type = %s", type ? type : "");
+
+    if (!servesKind(isTapeLike(type), id))
+    {
+        TLOG(LL_INFO, "Continue with next rport. Looking for another device type ");
+        return false;
+    }
+
+    return true;
 }
 
 String trimmed(char* text)
@@ -113,9 +135,13 @@ String unitName(const _hbaLunInfo& lun)
     return String(name);
 }
 
+const String describeStorageExtent("It is a unique identification for a Storage Extent");
+const String describeTapeDrive("It is a unique identification for a Tape Drive");
+const String describeLogicalDisk("It is a unique identification for a Logical Disk");
+
 // What the three classes share. The DeviceID ties a unit to its local and
 // remote port, which is how the paths of the host's view find it.
-void setCommon(CIM_LogicalDevice* p, classId_t id, const char* description,
+void setCommon(CIM_LogicalDevice* p, classId_t id, const String& description,
     _hbaPortInfo& port, _hbaLunInfo& lun)
 {
     ProviderUtil* util = ProviderUtil::getProviderUtil();
@@ -140,7 +166,7 @@ void setCommon(CIM_LogicalDevice* p, classId_t id, const char* description,
     p->OtherIdentifyingInfo.set(other);
 
     Array<String> descriptions;
-    descriptions.append(String(description));
+    descriptions.append(description);
     p->IdentifyingDescriptions.set(descriptions);
 
     Array<uint16> status;
@@ -160,7 +186,21 @@ String serialName(_hbaLunInfo& lun)
 
 } // namespace
 
-Array<Instance*> TargetHelper::getTargetInstances(_hbaPortInfo port, classId_t id)
+const Json::Value* TargetHelper::listedDeviceData(const Json::Value& remotePort)
+{
+    const Json::Value& device = member(remotePort, "deviceData");
+
+    if (!device.isObject() || !device["isTarget"].isBool())
+        return 0;
+
+    if (device["isTarget"].asBool() && !device["type"].isString())
+        return 0;
+
+    return &device;
+}
+
+Array<Instance*> TargetHelper::getTargetInstances(_hbaPortInfo port, classId_t id,
+    const _keyLookup* lookup)
 {
     Array<Instance*> result;
 
@@ -184,8 +224,10 @@ Array<Instance*> TargetHelper::getTargetInstances(_hbaPortInfo port, classId_t i
 
     // Once one unit of this port lacks a description, the library's
     // descriptions of the port aren't trusted any more: every later unit is
-    // named by its serial number instead.
+    // named by its serial number instead. Only the logical disk doesn't
+    // show what the rule changes.
     bool serialRule = false;
+    bool ruleMatters = id != ID_VESPERA_LogicalDisk;
 
     for (Json::ArrayIndex r = 0; r < remotePorts.size(); r++)
     {
@@ -197,6 +239,25 @@ Array<Instance*> TargetHelper::getTargetInstances(_hbaPortInfo port, classId_t i
                 port.portWwn);
             continue;
         }
+
+        char plainRemote[sizeof(((_hbaLunInfo*)0)->rPortWwn)] = "";
+        copyField(plainRemote, sizeof(plainRemote),
+            ProviderUtil::eraseColonsFromIndex(String(remoteWwn)).c_str());
+
+        // A look-up reads another remote port only while its units can
+        // still change how the one looked for is named.
+        bool candidate = !lookup || lookup->isBehind(port.portWwn, plainRemote);
+
+        if (!candidate && (serialRule || !ruleMatters))
+            continue;
+
+        // The list answers whether a remote port serves this class where it
+        // carries the device data: then only the ports that do are read
+        // whole, with their logical units.
+        const Json::Value* listed = listedDeviceData(remotePorts[r]);
+
+        if (listed && !serves(*listed, id))
+            continue;
 
         request["rPortWwn"] = remoteWwn;
 
@@ -212,28 +273,15 @@ Array<Instance*> TargetHelper::getTargetInstances(_hbaPortInfo port, classId_t i
         }
 
         const Json::Value& device = member(reply, "deviceData");
-        const Json::Value& isTarget = member(device, "isTarget");
 
-        if (!isTarget.isBool())
+        if (!member(device, "isTarget").isBool())
         {
             TLOG(LL_ERR, "No device data for Rport %s.", remoteWwn);
             continue;
         }
 
-        if (!isTarget.asBool())
-        {
-            TLOG(LL_DBG, "Nothing to do since the its not a Target Rport.");
+        if (!serves(device, id))
             continue;
-        }
-
-        const char* type = textOf(device, "type");
-        TLOG(LL_DBG, "Device type = %s", type ? type : "");
-
-        if (!serves(isTapeLike(type), id))
-        {
-            TLOG(LL_INFO, "Continue with next rport. Looking for another device type ");
-            continue;
-        }
 
         const Json::Value& luns = member(reply, "lunList");
 
@@ -251,8 +299,7 @@ Array<Instance*> TargetHelper::getTargetInstances(_hbaPortInfo port, classId_t i
 
             _hbaLunInfo lun;
             memset(&lun, 0, sizeof(lun));
-            copyField(lun.rPortWwn, sizeof(lun.rPortWwn),
-                ProviderUtil::eraseColonsFromIndex(String(remoteWwn)).c_str());
+            memcpy(lun.rPortWwn, plainRemote, sizeof(lun.rPortWwn));
 
             const Json::Value& number = member(unit, "number");
             const char* vendor = textOf(unit, "vendor");
@@ -292,6 +339,9 @@ Array<Instance*> TargetHelper::getTargetInstances(_hbaPortInfo port, classId_t i
                     lun.idType = LUN_ID_NONE;
             }
 
+            if (!candidate || (lookup && !lookup->endsWith(unitName(lun).c_str())))
+                continue;
+
             Instance* instance = 0;
 
             if (id == ID_VESPERA_StorageExtent)
@@ -302,6 +352,9 @@ Array<Instance*> TargetHelper::getTargetInstances(_hbaPortInfo port, classId_t i
                 instance = getLogicalDiskInstance(port, lun);
 
             result.append(instance);
+
+            if (lookup && lookup->keepMatch(result, result.size() - 1))
+                return result;
         }
     }
 
@@ -313,7 +366,7 @@ Instance* TargetHelper::getStorageExtentInstance(_hbaPortInfo port, _hbaLunInfo 
     VESPERA_StorageExtent* p = create<VESPERA_StorageExtent>(true);
 
     setCommon(p, ID_VESPERA_StorageExtent,
-        "It is a unique identification for a Storage Extent", port, lun);
+        describeStorageExtent, port, lun);
 
     uint16 format = 0;
     uint16 space = 0;
@@ -364,7 +417,7 @@ Instance* TargetHelper::getTapeDriveInstance(_hbaPortInfo port, _hbaLunInfo lun)
     VESPERA_TapeDrive* p = create<VESPERA_TapeDrive>(true);
 
     setCommon(p, ID_VESPERA_TapeDrive,
-        "It is a unique identification for a Tape Drive", port, lun);
+        describeTapeDrive, port, lun);
 
     switch (lun.idType)
     {
@@ -394,7 +447,7 @@ Instance* TargetHelper::getLogicalDiskInstance(_hbaPortInfo port, _hbaLunInfo lu
     VESPERA_LogicalDisk* p = create<VESPERA_LogicalDisk>(true);
 
     setCommon(p, ID_VESPERA_LogicalDisk,
-        "It is a unique identification for a Logical Disk", port, lun);
+        describeLogicalDisk, port, lun);
 
     p->Name.set(lun.description);
     p->NameFormat.set(1);

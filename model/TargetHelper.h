@@ -1,6 +1,8 @@
 #ifndef _VSPR_TargetHelper_h
 #define _VSPR_TargetHelper_h
 
+#include <json/json.h>
+
 #include "Array.h"
 #include "Instance.h"
 #include "ProviderTypes.h"
@@ -42,8 +44,16 @@ public:
 
     static TargetHelper* getTargetHelperObject();
 
-    // For id 9, 16 or 38; any other id gives nothing.
-    Array<Instance*> getTargetInstances(_hbaPortInfo port, classId_t id);
+    // For id 9, 16 or 38; any other id gives nothing. With a lookup, the
+    // units that can't be the one it looks for aren't built, and the walk
+    // stops at the one that is.
+    Array<Instance*> getTargetInstances(_hbaPortInfo port, classId_t id,
+        const _keyLookup* lookup = 0);
+
+    // The "deviceData" of an element of getAllRemotePorts, if the list
+    // carries it whole enough to tell a target and its kind; null if only
+    // getCompleteRemotePort can tell.
+    static const Json::Value* listedDeviceData(const Json::Value& remotePort);
 
     Instance* getStorageExtentInstance(_hbaPortInfo port, _hbaLunInfo lun);
     Instance* getTapeDriveInstance(_hbaPortInfo port, _hbaLunInfo lun);

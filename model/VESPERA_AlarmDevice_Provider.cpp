@@ -8,6 +8,16 @@
 namespace OLMA
 {
 
+Get_Instance_Status VESPERA_AlarmDevice_Provider::get_instance(const VESPERA_AlarmDevice* model,
+    VESPERA_AlarmDevice*& instance)
+{
+    TLOG(LL_DBG, "Entering: %s", "get_instance");
+    Get_Instance_Status status = deliverInstance(
+        FCHBAManager::getFCHBAManager()->getInstance(ID_VESPERA_AlarmDevice, model), instance);
+    TLOG(LL_DBG, "Returning: %s", "get_instance");
+    return status;
+}
+
 Enum_Instances_Status VESPERA_AlarmDevice_Provider::enum_instances(
     const VESPERA_AlarmDevice*, Enum_Instances_Handler<VESPERA_AlarmDevice>* handler)
 {

@@ -7,10 +7,13 @@
 namespace OLMA
 {
 
-// Serves VESPERA_AlarmDevice: enumeration from FCHBAManager, and SetAlarmState.
+// Serves VESPERA_AlarmDevice from FCHBAManager: enumeration, getInstance by
+// looking up the one instance that the keys name, and SetAlarmState.
 class VESPERA_AlarmDevice_Provider
 {
 public:
+
+    Get_Instance_Status get_instance(const VESPERA_AlarmDevice* model, VESPERA_AlarmDevice*& instance);
 
     Enum_Instances_Status enum_instances(
         const VESPERA_AlarmDevice* model, Enum_Instances_Handler<VESPERA_AlarmDevice>* handler);

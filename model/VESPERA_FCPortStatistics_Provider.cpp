@@ -7,6 +7,16 @@
 namespace OLMA
 {
 
+Get_Instance_Status VESPERA_FCPortStatistics_Provider::get_instance(const VESPERA_FCPortStatistics* model,
+    VESPERA_FCPortStatistics*& instance)
+{
+    TLOG(LL_DBG, "Entering: %s", "get_instance");
+    Get_Instance_Status status = deliverInstance(
+        FCHBAManager::getFCHBAManager()->getInstance(ID_VESPERA_FCPortStatistics, model), instance);
+    TLOG(LL_DBG, "Returning: %s", "get_instance");
+    return status;
+}
+
 Enum_Instances_Status VESPERA_FCPortStatistics_Provider::enum_instances(
     const VESPERA_FCPortStatistics*, Enum_Instances_Handler<VESPERA_FCPortStatistics>* handler)
 {

@@ -7,10 +7,13 @@
 namespace OLMA
 {
 
-// Serves VESPERA_FCPortStatistics: enumeration only, from FCHBAManager.
+// Serves VESPERA_FCPortStatistics from FCHBAManager: enumeration, and getInstance by
+// looking up the one instance that the keys name.
 class VESPERA_FCPortStatistics_Provider
 {
 public:
+
+    Get_Instance_Status get_instance(const VESPERA_FCPortStatistics* model, VESPERA_FCPortStatistics*& instance);
 
     Enum_Instances_Status enum_instances(
         const VESPERA_FCPortStatistics* model, Enum_Instances_Handler<VESPERA_FCPortStatistics>* handler);

@@ -7,6 +7,16 @@
 namespace OLMA
 {
 
+Get_Instance_Status VESPERA_PhysicalConnector_Provider::get_instance(const VESPERA_PhysicalConnector* model,
+    VESPERA_PhysicalConnector*& instance)
+{
+    TLOG(LL_DBG, "Entering: %s", "get_instance");
+    Get_Instance_Status status = deliverInstance(
+        FCHBAManager::getFCHBAManager()->getInstance(ID_VESPERA_PhysicalConnector, model), instance);
+    TLOG(LL_DBG, "Returning: %s", "get_instance");
+    return status;
+}
+
 Enum_Instances_Status VESPERA_PhysicalConnector_Provider::enum_instances(
     const VESPERA_PhysicalConnector*, Enum_Instances_Handler<VESPERA_PhysicalConnector>* handler)
 {

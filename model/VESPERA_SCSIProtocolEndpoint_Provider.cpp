@@ -7,6 +7,16 @@
 namespace OLMA
 {
 
+Get_Instance_Status VESPERA_SCSIProtocolEndpoint_Provider::get_instance(const VESPERA_SCSIProtocolEndpoint* model,
+    VESPERA_SCSIProtocolEndpoint*& instance)
+{
+    TLOG(LL_DBG, "Entering: %s", "get_instance");
+    Get_Instance_Status status = deliverInstance(
+        FCHBAManager::getFCHBAManager()->getInstance(ID_VESPERA_SCSIProtocolEndpoint, model), instance);
+    TLOG(LL_DBG, "Returning: %s", "get_instance");
+    return status;
+}
+
 Enum_Instances_Status VESPERA_SCSIProtocolEndpoint_Provider::enum_instances(
     const VESPERA_SCSIProtocolEndpoint*, Enum_Instances_Handler<VESPERA_SCSIProtocolEndpoint>* handler)
 {

@@ -7,6 +7,16 @@
 namespace OLMA
 {
 
+Get_Instance_Status VESPERA_StorageExtent_Provider::get_instance(const VESPERA_StorageExtent* model,
+    VESPERA_StorageExtent*& instance)
+{
+    TLOG(LL_DBG, "Entering: %s", "get_instance");
+    Get_Instance_Status status = deliverInstance(
+        HDRManager::getHDRManager()->getInstance(ID_VESPERA_StorageExtent, model), instance);
+    TLOG(LL_DBG, "Returning: %s", "get_instance");
+    return status;
+}
+
 Enum_Instances_Status VESPERA_StorageExtent_Provider::enum_instances(
     const VESPERA_StorageExtent*, Enum_Instances_Handler<VESPERA_StorageExtent>* handler)
 {

@@ -7,10 +7,13 @@
 namespace OLMA
 {
 
-// Serves VESPERA_StorageExtent: enumeration only, from HDRManager.
+// Serves VESPERA_StorageExtent from HDRManager: enumeration, and getInstance by
+// looking up the one instance that the keys name.
 class VESPERA_StorageExtent_Provider
 {
 public:
+
+    Get_Instance_Status get_instance(const VESPERA_StorageExtent* model, VESPERA_StorageExtent*& instance);
 
     Enum_Instances_Status enum_instances(
         const VESPERA_StorageExtent* model, Enum_Instances_Handler<VESPERA_StorageExtent>* handler);

@@ -7,6 +7,16 @@
 namespace OLMA
 {
 
+Get_Instance_Status VESPERA_TapeDrive_Provider::get_instance(const VESPERA_TapeDrive* model,
+    VESPERA_TapeDrive*& instance)
+{
+    TLOG(LL_DBG, "Entering: %s", "get_instance");
+    Get_Instance_Status status = deliverInstance(
+        HDRManager::getHDRManager()->getInstance(ID_VESPERA_TapeDrive, model), instance);
+    TLOG(LL_DBG, "Returning: %s", "get_instance");
+    return status;
+}
+
 Enum_Instances_Status VESPERA_TapeDrive_Provider::enum_instances(
     const VESPERA_TapeDrive*, Enum_Instances_Handler<VESPERA_TapeDrive>* handler)
 {

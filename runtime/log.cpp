@@ -7,6 +7,7 @@
 #include <strings.h>
 #include <sys/stat.h>
 #include <sys/types.h>
+#include <time.h>
 #include "log.h"
 #include "Buffer.h"
 #include "Datetime.h"
@@ -31,6 +32,50 @@ static FILE* _log_file_handle = 0;
 static File_Lock* _lock = 0;
 static bool _initialized = false;
 static pthread_mutex_t _mutex = PTHREAD_MUTEX_INITIALIZER;
+
+// What the configuration file was when it was last read and found wanting,
+// so that a file that hasn't changed isn't read again.
+struct _Config_Identity
+{
+    bool known;
+    dev_t dev;
+    ino_t ino;
+    off_t size;
+    struct timespec mtime;
+};
+
+static _Config_Identity _last_config = { false, 0, 0, 0, { 0, 0 } };
+
+// Read without _mutex by every message, written under it: the level in
+// force while the log is open, -1 while it is closed; and while closed, the
+// time (coarse monotonic, in ms) before which the configuration isn't
+// looked at again. A closed log so costs a check of the clock per message.
+static int _threshold = -1;
+static long long _next_look_ms = 0;
+
+static const long long _LOOK_INTERVAL_MS = 1000;
+
+static long long _now_ms()
+{
+    struct timespec ts;
+    clock_gettime(CLOCK_MONOTONIC_COARSE, &ts);
+    return (long long)ts.tv_sec * 1000 + ts.tv_nsec / 1000000;
+}
+
+static void _set_threshold(int level)
+{
+    __atomic_store_n(&_threshold, level, __ATOMIC_RELEASE);
+}
+
+bool log_wanted(Log_Level level)
+{
+    int threshold = __atomic_load_n(&_threshold, __ATOMIC_ACQUIRE);
+
+    if (threshold >= 0)
+        return (int)level <= threshold;
+
+    return _now_ms() >= __atomic_load_n(&_next_look_ms, __ATOMIC_RELAXED);
+}
 
 int _validate_log_level(const char* str, Log_Level& level)
 {
@@ -123,11 +168,37 @@ static void _open()
     if (n < 0 || (size_t)n >= sizeof(path))
         return;
 
+    // A file that is as it was when it last failed to turn the log on
+    // would fail again.
+    struct stat st;
+
+    if (stat(path, &st) != 0)
+    {
+        _last_config.known = false;
+        return;
+    }
+
+    if (_last_config.known && _last_config.dev == st.st_dev &&
+        _last_config.ino == st.st_ino && _last_config.size == st.st_size &&
+        _last_config.mtime.tv_sec == st.st_mtim.tv_sec &&
+        _last_config.mtime.tv_nsec == st.st_mtim.tv_nsec)
+    {
+        return;
+    }
+
     Log_Level level;
 
     if (_read_config(path, level) != 0)
+    {
+        _last_config.known = true;
+        _last_config.dev = st.st_dev;
+        _last_config.ino = st.st_ino;
+        _last_config.size = st.st_size;
+        _last_config.mtime = st.st_mtim;
         return;
+    }
 
+    _last_config.known = false;
     _level = level;
 
     char dir[_PATH_SIZE];
@@ -163,15 +234,31 @@ static void _open()
     _lock = lock;
     _log_file_handle = os;
     _initialized = true;
+    _set_threshold(_level);
 }
 
 void vlog(Log_Level level, const char* file, size_t line, const char* fmt,
     va_list ap)
 {
+    if (!log_wanted(level))
+        return;
+
     pthread_mutex_lock(&_mutex);
 
+    // A closed log looks at its configuration at most once a second, so
+    // that a module whose log is off doesn't pay for a file system look-up
+    // per message; creating the file still turns the log on within a
+    // second, without a restart.
     if (!_initialized)
-        _open();
+    {
+        long long now = _now_ms();
+
+        if (now >= _next_look_ms)
+        {
+            __atomic_store_n(&_next_look_ms, now + _LOOK_INTERVAL_MS, __ATOMIC_RELAXED);
+            _open();
+        }
+    }
 
     if (!_initialized || (unsigned)level > (unsigned)_level)
     {
@@ -238,6 +325,10 @@ int log_set_level(const String& level)
 
     pthread_mutex_lock(&_mutex);
     _level = x;
+
+    if (_initialized)
+        _set_threshold(_level);
+
     pthread_mutex_unlock(&_mutex);
     return 0;
 }
@@ -253,7 +344,12 @@ void close_log()
         fclose(_log_file_handle);
         _log_file_handle = 0;
         _initialized = false;
+        _set_threshold(-1);
     }
+
+    // The next message looks at the configuration at once.
+    _last_config.known = false;
+    __atomic_store_n(&_next_look_ms, 0, __ATOMIC_RELAXED);
 
     pthread_mutex_unlock(&_mutex);
 }

@@ -23,11 +23,17 @@ extern const char* const _log_level_strings[5];
 extern bool _log_enabled_state;
 
 // Writes one line to $HOME/.tessel/messages if the level is in force. The
-// log opens itself on the first message once $HOME/.tesselrc names a level.
+// log opens itself on a message once $HOME/.tesselrc names a level; while
+// it is closed, the file is looked at again at most once a second.
 void log(Log_Level level, const char* file, size_t line, const char* fmt, ...)
     __attribute__((format(printf, 4, 5)));
 void vlog(Log_Level level, const char* file, size_t line, const char* fmt,
     va_list ap) __attribute__((format(printf, 4, 0)));
+
+// Whether a message of this level may be written: the log is open at a
+// level that takes it, or it is closed and due for another look at its
+// configuration (at most once a second). Costs a check, no lock.
+bool log_wanted(Log_Level level);
 
 struct Log_Call_Frame
 {
@@ -50,7 +56,8 @@ int log_set_level(const String& level);
 // 0 and the level if str names one in any case, else -1.
 int _validate_log_level(const char* str, Log_Level& level);
 
-// Closes the log; the next message opens it again. The level stays.
+// Closes the log; the next message looks at the configuration at once and
+// opens it again. The level stays.
 void close_log();
 
 // Prints "file(line): function(): assert: expr" to stderr and aborts.
@@ -69,7 +76,7 @@ void __tessel_trace(const char* file, size_t line, const char* function);
 #define TLOG(LEVEL, ...) \
     do \
     { \
-        if (OLMA::_log_enabled_state) \
+        if (OLMA::_log_enabled_state && OLMA::log_wanted(LEVEL)) \
             OLMA::Log_Call_Frame(LEVEL, TESSEL_FILE_BASENAME, __LINE__).invoke(__VA_ARGS__); \
     } \
     while (0)

@@ -2,6 +2,7 @@
 
 #include <cstdio>
 #include <cstring>
+#include <strings.h>
 #include "log.h"
 #include "cimom.h"
 #include "ProviderUtil.h"
@@ -49,6 +50,23 @@ namespace
 // first, SFCB in the second.
 const char* const INTEROP_NAMESPACES[] = { "root/PG_InterOp", "root/interop" };
 const char SERVED_NAMESPACE[] = "root/vespera";
+// The classes that are registered in the interop namespace too (the
+// registrations that tools/gen_providers.py writes name the same ones).
+const char* const INTEROP_CLASSES[] =
+{
+    "VESPERA_RegisteredProfile",
+    "VESPERA_RegisteredSubProfile",
+    "VESPERA_ProfileSoftwareIdentity",
+    "VESPERA_Namespace",
+    "VESPERA_CIMXMLCommunicationMechanism",
+    "VESPERA_ElementConformsToProfile",
+    "VESPERA_SubProfileRequiresProfile",
+    "VESPERA_ProfileElementSoftwareIdentity",
+    "VESPERA_CommMechanismForManager",
+    "VESPERA_NamespaceInManager",
+    "VESPERA_ObjectManagerHostedService",
+    "VESPERA_CommMechHostedAccessPoint",
+};
 // What the object manager is called when the CIM server can't tell us.
 const char CIM_SERVER[] = "CIM Server";
 
@@ -304,6 +322,30 @@ Array<String> ServerManager::getSubProfilesOfProfile(String name)
         break;
     }
     return result;
+}
+
+bool ServerManager::isServedInInterop(const char* className)
+{
+    if (!className)
+        return false;
+    for (size_t i = 0; i < sizeof(INTEROP_CLASSES) / sizeof(INTEROP_CLASSES[0]); i++)
+    {
+        if (strcasecmp(className, INTEROP_CLASSES[i]) == 0)
+            return true;
+    }
+    return false;
+}
+
+void ServerManager::placeReference(Instance* reference, const String& requestNamespace)
+{
+    if (!reference || !reference->meta_class)
+        return;
+    if (requestNamespace.size() == 0 || requestNamespace.equali(SERVED_NAMESPACE))
+        return;
+    if (isServedInInterop(reference->meta_class->name))
+        reference->__name_space.clear();
+    else
+        reference->__name_space.assign(SERVED_NAMESPACE);
 }
 
 template<class T>

@@ -48,6 +48,16 @@ public:
     Array<Instance*> getProfileSoftwareIdentityInstances();
     Array<Instance*> getAgentServiceInstances();
 
+    // The profile classes are served in the CIM server's interop namespace
+    // as well as in root/vespera; every other class only in root/vespera.
+    static bool isServedInInterop(const char* className);
+
+    // Makes a reference built while serving a request in requestNamespace
+    // point where its instance can be had: an interop class answers in the
+    // request's namespace (the reference keeps none of its own), any other
+    // class only in root/vespera. A request in root/vespera changes nothing.
+    static void placeReference(Instance* reference, const String& requestNamespace);
+
 private:
     static ServerManager* serverHelperObj;
 };

@@ -96,6 +96,7 @@ struct Value
     static Value of_datetime(const std::string& cim_text);
     static Value of_ref(const Object_Path& path);
     static Value of_instance(const Instance& inst);
+    static Value of_instance(Instance&& inst);
     static Value null_of(CMPIType type);
 };
 
@@ -168,8 +169,9 @@ struct Options
     std::string module_path;
     std::string reg_path;
     // Serve CIM_ObjectManager in the interop namespace from the built-in
-    // stand-in. When off, enumerations of that namespace fail with
-    // CMPI_RC_ERR_INVALID_NAMESPACE.
+    // stand-in, beside whatever the module registers there. When off,
+    // enumerations of that namespace fail with CMPI_RC_ERR_INVALID_NAMESPACE,
+    // unless the module serves classes there.
     bool interop = true;
     // When on together with interop, the stand-in answers with no instance.
     bool interop_empty = false;

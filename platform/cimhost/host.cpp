@@ -184,9 +184,12 @@ public:
         return false;
     }
 
+    // Whether the stand-in object manager answers in ns. A module may serve
+    // classes of its own there too, as it would in a real server's interop
+    // namespace; both then answer.
     bool is_interop(const std::string& ns) const
     {
-        return name_eq(ns, opts.interop_namespace) && !known_ns(ns);
+        return opts.interop && name_eq(ns, opts.interop_namespace);
     }
 
     void* mi_for(const std::string& provider, unsigned kind, const std::string& ns, CMPIrc& rc,
@@ -264,9 +267,11 @@ const char* kind_word(unsigned kind)
     }
 }
 
-void fill_from(std::vector<Value>& out, const Collector& c)
+void fill_from(std::vector<Value>& out, Collector& c)
 {
-    out.insert(out.end(), c.items.begin(), c.items.end());
+    out.insert(out.end(), std::make_move_iterator(c.items.begin()),
+               std::make_move_iterator(c.items.end()));
+    c.items.clear();
 }
 
 //
@@ -1225,7 +1230,11 @@ CMPIrc Host_Impl::do_enum(Object_Path cls, const char** props, bool names,
     if (rc != CMPI_RC_OK)
         return rc;
     if (is_interop(cls.name_space))
-        return interop_enum(cls, names, out);
+    {
+        interop_enum(cls, names, out);
+        if (!known_ns(cls.name_space))
+            return CMPI_RC_OK;
+    }
     std::vector<const Registration_Entry*> rs =
         find_regs(cls.name_space, cls.class_name, MI_INSTANCE, true, rc, msg);
     if (rc != CMPI_RC_OK)
@@ -1283,7 +1292,8 @@ CMPIrc Host_Impl::do_get(Object_Path path, const char** props, Value& out, std::
                 out = v;
                 return CMPI_RC_OK;
             }
-        return CMPI_RC_ERR_NOT_FOUND;
+        if (!known_ns(path.name_space))
+            return CMPI_RC_ERR_NOT_FOUND;
     }
     std::vector<const Registration_Entry*> rs =
         find_regs(path.name_space, path.class_name, MI_INSTANCE, false, rc, msg);
@@ -1428,7 +1438,7 @@ CMPIrc Host_Impl::do_assoc(Assoc_Op op, Object_Path path, const std::string& ass
     CMPIrc rc = check_ns(path.name_space, msg);
     if (rc != CMPI_RC_OK)
         return rc;
-    if (is_interop(path.name_space))
+    if (is_interop(path.name_space) && !known_ns(path.name_space))
         return CMPI_RC_OK;
     if (!knows_class(path.class_name))
     {
@@ -1797,14 +1807,26 @@ static Result not_loaded(const Host_Impl* h)
     return r;
 }
 
+// Hands what the providers returned to the caller: an instance or path that
+// nothing else shares moves, without a copy.
+template<class T>
+static void take(std::shared_ptr<T>& from, std::vector<T>& to)
+{
+    if (from.use_count() == 1)
+        to.push_back(std::move(*from));
+    else
+        to.push_back(*from);
+}
+
 static void split(std::vector<Value>& items, Result& r)
 {
+    r.instances.reserve(items.size());
     for (Value& v : items)
     {
         if (v.type == CMPI_instance && v.inst)
-            r.instances.push_back(*v.inst);
+            take(v.inst, r.instances);
         else if (v.type == CMPI_ref && v.ref)
-            r.paths.push_back(*v.ref);
+            take(v.ref, r.paths);
     }
 }
 
@@ -1849,7 +1871,7 @@ Result Host::gi(const Object_Path& path, const std::vector<std::string>* props)
         r.rc = impl->do_get(path, pl.get(props), v, r.message);
     }
     if (r.rc == CMPI_RC_OK && v.inst)
-        r.instances.push_back(*v.inst);
+        take(v.inst, r.instances);
     return r;
 }
 

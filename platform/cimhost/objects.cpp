@@ -388,13 +388,13 @@ CMPIResult* res_clone(const CMPIResult*, CMPIStatus* rc)
     return nullptr;
 }
 
-CMPIStatus res_add(const CMPIResult* r, const Value& v)
+CMPIStatus res_add(const CMPIResult* r, Value v)
 {
     Result_Obj* o = as<Result_Obj>(r, K_RESULT);
     if (!o)
         return status(CMPI_RC_ERR_INVALID_HANDLE);
     if (o->sink)
-        o->sink->items.push_back(v);
+        o->sink->items.push_back(std::move(v));
     return status(CMPI_RC_OK);
 }
 
@@ -404,7 +404,7 @@ CMPIStatus res_data(const CMPIResult* r, const CMPIValue* v, CMPIType t)
     CMPIrc rc = from_cmpi(v, t, val, "CMReturnData");
     if (rc != CMPI_RC_OK)
         return status(rc);
-    return res_add(r, val);
+    return res_add(r, std::move(val));
 }
 
 CMPIStatus res_instance(const CMPIResult* r, const CMPIInstance* i)
@@ -1088,9 +1088,46 @@ CMPISelectExpFT select_ft = {100, se_release, se_clone, se_evaluate, se_string, 
 // Deeper than this, a container refers to itself.
 const int MAX_DEPTH = 64;
 
-Value resolve_at(const Held& h, const std::string& where, int depth);
+// Where a read stands: the steps that led there. Their text ("CMPIInstance
+// of X > property Y > ...") is only built for a message, so that reading a
+// sound object costs no strings.
+struct Where
+{
+    enum Step { TEXT, NAMED, NUMBERED, ARRAY_OF };
 
-Instance read_instance_at(const Inst_Obj* o, const std::string& where, int depth)
+    Step kind;
+    const Where* up;
+    const char* label;
+    const std::string* text;   // TEXT: the whole step; NAMED: the name
+    size_t number;             // NUMBERED: the index; ARRAY_OF: the element type
+
+    std::string str() const
+    {
+        std::string here;
+        switch (kind)
+        {
+        case TEXT: here = *text; break;
+        case NAMED: here = std::string(label) + *text; break;
+        case NUMBERED: here = std::string(label) + std::to_string(number); break;
+        case ARRAY_OF: here = std::string(label) + type_name(CMPIType(number)); break;
+        }
+        return up ? step(up->str(), here) : here;
+    }
+};
+
+Where at_text(const std::string& text, const Where* up = nullptr)
+{
+    return Where {Where::TEXT, up, nullptr, &text, 0};
+}
+
+Where at_name(const Where& up, const char* label, const std::string& name)
+{
+    return Where {Where::NAMED, &up, label, &name, 0};
+}
+
+Value resolve_at(const Held& h, const Where& where, int depth);
+
+Instance read_instance_at(const Inst_Obj* o, const Where& where, int depth)
 {
     Instance inst;
     inst.class_name = o->class_name;
@@ -1099,52 +1136,55 @@ Instance read_instance_at(const Inst_Obj* o, const std::string& where, int depth
     inst.path.class_name = o->class_name;
     for (const std::string& k : o->key_names)
         inst.path.keys.push_back(Property {k, Value()});
-    std::string here = step(where, "CMPIInstance of " + o->class_name);
+    Where here = at_name(where, "CMPIInstance of ", o->class_name);
+    inst.properties.reserve(o->props.size());
     for (const Held_Property& p : o->props)
         inst.properties.push_back(
-            Property {p.name, resolve_at(p.held, step(here, "property " + p.name), depth)});
+            Property {p.name, resolve_at(p.held, at_name(here, "property ", p.name), depth)});
     inst.path = instance_path(inst);
     return inst;
 }
 
-Object_Path read_path_at(const Path_Obj* o, const std::string& where, int depth)
+Object_Path read_path_at(const Path_Obj* o, const Where& where, int depth)
 {
     Object_Path p;
     p.host = o->host;
     p.name_space = o->name_space;
     p.class_name = o->class_name;
-    std::string here = step(where, "CMPIObjectPath " + o->name_space + ":" + o->class_name);
+    std::string text = "CMPIObjectPath " + o->name_space + ":" + o->class_name;
+    Where here = at_text(text, &where);
     for (const Held_Property& k : o->keys)
-        p.keys.push_back(Property {k.name, resolve_at(k.held, step(here, "key " + k.name), depth)});
+        p.keys.push_back(Property {k.name, resolve_at(k.held, at_name(here, "key ", k.name), depth)});
     return p;
 }
 
-Value read_array_at(const Array_Obj* o, const std::string& where, int depth)
+Value read_array_at(const Array_Obj* o, const Where& where, int depth)
 {
     Value v;
     v.type = CMPIType(o->el | CMPI_ARRAY);
     v.null = false;
-    std::string here = step(where, "CMPIArray of " + type_name(o->el));
+    Where here {Where::ARRAY_OF, &where, "CMPIArray of ", nullptr, size_t(o->el)};
+    v.elements.reserve(o->items.size());
     for (size_t i = 0; i < o->items.size(); i++)
     {
-        Value e = resolve_at(o->items[i], step(here, "element " + std::to_string(i)), depth);
-        e.type = o->el;
-        v.elements.push_back(e);
+        Where element {Where::NUMBERED, &here, "element ", nullptr, i};
+        v.elements.push_back(resolve_at(o->items[i], element, depth));
+        v.elements.back().type = o->el;
     }
     return v;
 }
 
-Value resolve_at(const Held& h, const std::string& where, int depth)
+Value resolve_at(const Held& h, const Where& where, int depth)
 {
     if (!h.obj)
         return h.value;
     const Obj* o = h.obj;
     if (o->magic == OBJ_RELEASED && o->hdl == o)
-        used_after_release(o, where);
+        used_after_release(o, where.str());
     if (depth > MAX_DEPTH)
     {
         fprintf(stderr, "cimhost: %s: objects nested too deep; does one hold itself?\n",
-                where.c_str());
+                where.str().c_str());
         abort();
     }
     switch (o->kind)
@@ -1458,7 +1498,7 @@ CMPIrc hold(const CMPIValue* v, CMPIType type, Held& out, const std::string& whe
 
 Value resolve(const Held& h, const std::string& where)
 {
-    return resolve_at(h, where, 0);
+    return resolve_at(h, at_text(where), 0);
 }
 
 CMPIrc from_cmpi(const CMPIValue* v, CMPIType type, Value& out, const std::string& where)
@@ -1471,12 +1511,12 @@ CMPIrc from_cmpi(const CMPIValue* v, CMPIType type, Value& out, const std::strin
 
 Instance read_instance(const Inst_Obj* o, const std::string& what)
 {
-    return read_instance_at(o, what, 0);
+    return read_instance_at(o, at_text(what), 0);
 }
 
 Object_Path read_path(const Path_Obj* o, const std::string& what)
 {
-    return read_path_at(o, what, 0);
+    return read_path_at(o, at_text(what), 0);
 }
 
 std::vector<Property> read_args(const Args_Obj* o, const std::string& what)
@@ -1490,7 +1530,7 @@ std::vector<Property> read_args(const Args_Obj* o, const std::string& what)
 
 Value read_array(const Array_Obj* o, const std::string& what)
 {
-    return read_array_at(o, what, 0);
+    return read_array_at(o, at_text(what), 0);
 }
 
 CMPIData to_cmpi(const Value& v)

@@ -265,6 +265,15 @@ Value Value::of_instance(const Instance& inst)
     return v;
 }
 
+Value Value::of_instance(Instance&& inst)
+{
+    Value v;
+    v.type = CMPI_instance;
+    v.null = false;
+    v.inst = std::make_shared<Instance>(std::move(inst));
+    return v;
+}
+
 Value Value::null_of(CMPIType type)
 {
     Value v;

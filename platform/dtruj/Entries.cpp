@@ -3,6 +3,7 @@
 #include "Sim.h"
 #include "Console.h"
 
+#include <atomic>
 #include <chrono>
 #include <cmath>
 #include <cstdio>
@@ -58,8 +59,52 @@ bool applyFault(const char* entry, Json::Value& reply)
     return false;  // a plain delay
 }
 
-Json::Value call(const char* entry, const Json::Value& req, Handler h)
+// What each entry has cost since its counters were last read and reset:
+// calls, and the time spent in the library without the module's log
+// callback. bench/ reads them to tell the module's own time from the
+// library's.
+struct EntryCounter {
+    explicit EntryCounter(const char* n) : name(n), next(head())
+    {
+        head() = this;
+    }
+    static EntryCounter*& head()
+    {
+        static EntryCounter* first = nullptr;
+        return first;
+    }
+    const char* name;
+    std::atomic<uint64_t> calls{0};
+    std::atomic<uint64_t> ns{0};
+    EntryCounter* next;
+};
+
+uint64_t monotonicNs()
 {
+    return uint64_t(std::chrono::duration_cast<std::chrono::nanoseconds>(
+        std::chrono::steady_clock::now().time_since_epoch()).count());
+}
+
+class Counting {
+public:
+    explicit Counting(EntryCounter& c)
+        : counter(c), start(monotonicNs()), callbacks(callbackNs()) {}
+    ~Counting()
+    {
+        uint64_t spent = monotonicNs() - start - (callbackNs() - callbacks);
+        counter.calls.fetch_add(1, std::memory_order_relaxed);
+        counter.ns.fetch_add(spent, std::memory_order_relaxed);
+    }
+
+private:
+    EntryCounter& counter;
+    uint64_t start;
+    uint64_t callbacks;
+};
+
+Json::Value call(const char* entry, const Json::Value& req, Handler h, EntryCounter& counter)
+{
+    Counting counting(counter);
     recordCall(entry, req);
     Json::Value reply;
     if (applyFault(entry, reply) || echoReply(entry, req, reply))
@@ -411,7 +456,11 @@ std::string colonMacPlus(const std::string& mac, int add)
 #define UNUSED __attribute__((unused))
 #define JSON_ENTRY(name)                                                          \
     static Json::Value do_##name(State& s UNUSED, const Json::Value& req UNUSED); \
-    DTRUJ_API Json::Value name(const Json::Value& req) { return call(#name, req, do_##name); } \
+    static EntryCounter counter_##name(#name);                                    \
+    DTRUJ_API Json::Value name(const Json::Value& req)                            \
+    {                                                                             \
+        return call(#name, req, do_##name, counter_##name);                       \
+    }                                                                             \
     static Json::Value do_##name(State& s UNUSED, const Json::Value& req UNUSED)
 
 // Every entry below answers from the simulated host under the one mutex.
@@ -1279,6 +1328,18 @@ static Json::Value* logicalPort(State& s, const PortRef& p, const std::string& l
     return findVport(s, p.place, lwwn);
 }
 
+static Json::UInt countVisibleLuns(const Json::Value& port, const Json::Value& rport)
+{
+    const Json::Value& list = rport["lunList"];
+    if (!port["lunMask"]["enabled"].asBool())
+        return list.size();
+    std::string rw = str(rport, "remotePortWwn");
+    Json::UInt n = 0;
+    for (const Json::Value& l : list)
+        n += lunVisible(port, rw, l["number"]);
+    return n;
+}
+
 static Json::Value visibleLuns(const Json::Value& port, const Json::Value& rport)
 {
     Json::Value luns(Json::arrayValue);
@@ -1302,7 +1363,7 @@ JSON_ENTRY(getAllRemotePorts)
         Json::Value e = rp;
         e.removeMember("lunList");
         e.removeMember("unchecked");
-        e["numOfLuns"] = Json::UInt(visibleLuns(*p.fc, rp).size());
+        e["numOfLuns"] = countVisibleLuns(*p.fc, rp);
         copyIfAny(e, "isTarget", rp["deviceData"]);
         overlayUnchecked(e, rp);
         r.append(e);
@@ -2084,6 +2145,21 @@ DTRUJ_API int dtruj_sim_reset()
 
 // The current state of the simulated host as a JSON text, for tests and
 // for users who want to see what their setters did. The caller frees it.
+DTRUJ_API char* dtruj_sim_counters(int reset)
+{
+    Json::Value all(Json::objectValue);
+    for (EntryCounter* c = EntryCounter::head(); c; c = c->next) {
+        uint64_t calls = reset ? c->calls.exchange(0) : c->calls.load();
+        uint64_t ns = reset ? c->ns.exchange(0) : c->ns.load();
+        if (!calls)
+            continue;
+        all[c->name]["calls"] = Json::UInt64(calls);
+        all[c->name]["ns"] = Json::UInt64(ns);
+    }
+    Json::FastWriter w;
+    return strdup(w.write(all).c_str());
+}
+
 DTRUJ_API char* dtruj_sim_dump()
 {
     State& s = state();

@@ -44,6 +44,12 @@ std::atomic<LogMsgCB>& logCallback()
     return cb;
 }
 
+uint64_t& callbackNs()
+{
+    thread_local uint64_t spent = 0;
+    return spent;
+}
+
 void simLog(int level, const char* file, int line, const char* fmt, ...)
 {
     LogMsgCB cb = logCallback().load();
@@ -57,8 +63,12 @@ void simLog(int level, const char* file, int line, const char* fmt, ...)
     va_end(ap);
     const char* base = strrchr(file, '/');
     base = base ? base + 1 : file;
-    if (cb)
+    if (cb) {
+        auto start = std::chrono::steady_clock::now();
         cb(level, base, line, buf);
+        callbackNs() += uint64_t(std::chrono::duration_cast<std::chrono::nanoseconds>(
+            std::chrono::steady_clock::now() - start).count());
+    }
     if (toStderr)
         fprintf(stderr, "dtruj[%d] %s:%d %s\n", level, base, line, buf);
 }

@@ -104,6 +104,10 @@ double now();
 std::atomic<EventProcessCB>& eventCallback();
 std::atomic<LogMsgCB>& logCallback();
 
+// The time this thread has spent in the module's log callback, in ns: the
+// module's time, not the library's.
+uint64_t& callbackNs();
+
 // Library log lines go through the module's callback if it registered one.
 void simLog(int level, const char* file, int line, const char* fmt, ...)
     __attribute__((format(printf, 4, 5)));

@@ -4,10 +4,13 @@
 
 #include <gtest/gtest.h>
 
+#include <signal.h>
 #include <stdlib.h>
 #include <sys/stat.h>
+#include <sys/wait.h>
 #include <unistd.h>
 
+#include <filesystem>
 #include <string>
 
 #include "TestSupport.h"
@@ -107,13 +110,63 @@ TEST_F(Shell, TftpRefusesAnythingButPlainNames)
     EXPECT_NE(0, stat((dir + "/pwned").c_str(), &st));
 }
 
+// A process of the given name for as long as the object lives: a copy of
+// sleep under that name.
+class NamedProcess
+{
+public:
+    NamedProcess(const std::string& dir, const std::string& name) : _pid(-1)
+    {
+        std::string exe = dir + "/" + name;
+        std::error_code ec;
+        std::filesystem::copy_file("/bin/sleep", exe,
+            std::filesystem::copy_options::overwrite_existing, ec);
+        if (ec)
+            return;
+        _pid = fork();
+        if (_pid == 0)
+        {
+            execl(exe.c_str(), name.c_str(), "60", (char*)0);
+            _exit(127);
+        }
+        // Until the child has become the program, /proc names it as this one.
+        std::string comm = "/proc/" + std::to_string(_pid) + "/comm";
+        for (int i = 0; i < 200 && readFile(comm) != name.substr(0, 15) + "\n"; i++)
+            usleep(10 * 1000);
+    }
+
+    ~NamedProcess()
+    {
+        if (_pid > 0)
+        {
+            kill(_pid, SIGTERM);
+            waitpid(_pid, 0, 0);
+        }
+    }
+
+private:
+    pid_t _pid;
+};
+
 TEST_F(Shell, AgentPortFollowsTheProcessList)
 {
     ProviderUtil* util = ProviderUtil::getProviderUtil();
-
-    script("ps", "echo '  PID TTY  TIME CMD'; echo ' 4242 ?  00:00:01 zarkagent'");
-    EXPECT_EQ(34568u, util->getAgentPort());
-
-    script("ps", "echo ' 4242 ?  00:00:01 zarkagent-old'");
     EXPECT_EQ(0u, util->getAgentPort());
+
+    // The process list is read without a shell: a ps on PATH isn't asked.
+    script("ps", "echo ' 4242 ?  00:00:01 zarkagent'");
+    EXPECT_EQ(0u, util->getAgentPort());
+
+    {
+        NamedProcess other(dir, "zarkagent-old");
+        EXPECT_EQ(0u, util->getAgentPort());
+    }
+
+    {
+        NamedProcess agent(dir, "zarkagent");
+        EXPECT_EQ(34568u, util->getAgentPort());
+    }
+
+    EXPECT_EQ(0u, util->getAgentPort());
+    EXPECT_EQ("", readFile(calls));
 }

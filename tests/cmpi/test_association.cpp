@@ -129,4 +129,31 @@ TEST_F(Association, EnumerationFailureReachesTheClient)
     EXPECT_EQ(CMPI_RC_ERR_FAILED, host->ri(path("part1", 1), "TST_Link").rc);
 }
 
+TEST_F(Association, ProviderSeesTheNamespaceOfTheRequest)
+{
+    // Classes served in two namespaces answer in the one asked, and the
+    // provider's model says which, whatever road the request takes.
+    state->count = 3;
+    ch::Object_Path part1 = path("part1", 1);
+    part1.name_space = "root/other";
+
+    ch::Result r = host->an(part1, "TST_Link");
+    ASSERT_TRUE(r.ok()) << r.message;
+    EXPECT_EQ(std::string("root/other"), state->link_model_ns);
+    ASSERT_EQ(2u, r.paths.size());
+    for (const ch::Object_Path& p : r.paths)
+        EXPECT_EQ("root/other", p.name_space);
+
+    r = host->rn(part1, "TST_Link");
+    ASSERT_TRUE(r.ok()) << r.message;
+    EXPECT_EQ(std::string("root/other"), state->link_model_ns);
+    ASSERT_EQ(2u, r.paths.size());
+    EXPECT_EQ("root/other", r.paths[0].name_space);
+    ASSERT_TRUE(r.paths[0].key("Left") && r.paths[0].key("Left")->ref);
+    EXPECT_EQ("root/other", r.paths[0].key("Left")->ref->name_space);
+
+    ASSERT_TRUE(host->an(path("part1", 1), "TST_Link").ok());
+    EXPECT_EQ(std::string("root/test"), state->link_model_ns);
+}
+
 } // namespace

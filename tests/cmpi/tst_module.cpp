@@ -244,8 +244,10 @@ public:
         return GET_INSTANCE_UNSUPPORTED;
     }
 
-    Enum_Instances_Status enum_instances(const TST_Link*, Enum_Instances_Handler<TST_Link>* handler)
+    Enum_Instances_Status enum_instances(const TST_Link* model, Enum_Instances_Handler<TST_Link>* handler)
     {
+        snprintf(_state.link_model_ns, sizeof(_state.link_model_ns), "%s",
+            model ? model->__name_space.c_str() : "(none)");
         if (_state.self_link && !handler->handle(tst_make_link("part0", 0, "part0", 0)))
             return ENUM_INSTANCES_OK;
 

@@ -53,6 +53,9 @@ struct Tst_State
     unsigned sent;
     bool stopped;
 
+    // The namespace of the model that the association provider last got.
+    char link_model_ns[32];
+
     // The last method call.
     char text[64];
     unsigned lines;

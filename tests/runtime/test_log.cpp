@@ -183,15 +183,56 @@ TEST_F(Log_Test, ConfigurationLinesThatDoNotEnable)
 
     for (const char* text : bad)
     {
+        // Closing makes the next message look at the file at once.
+        close_log();
         rc(text);
         TLOG(LL_FATAL, "off");
         EXPECT_FALSE(exists(".tessel")) << text;
     }
+}
 
-    // A failed open is retried on the next message.
+TEST_F(Log_Test, ClosedLogLooksAgainWithinASecond)
+{
+    // No file yet: the log stays off, and messages soon after don't look.
+    TLOG(LL_ERR, "before");
     rc("LOG_LEVEL=ERR\n");
+    usleep(1100 * 1000);
+
+    // Creating the file turns the log on without a restart.
     TLOG(LL_ERR, "now on");
     EXPECT_NE(messages().find("now on"), std::string::npos);
+    EXPECT_EQ(messages().find("before"), std::string::npos);
+    close_log();
+
+    // A file that fails is read again once it changes.
+    rc("LOG_LEVEL=VERBOSE\n");
+    TLOG(LL_ERR, "bad level");
+    rc("LOG_LEVEL=WARN\n");
+    usleep(1100 * 1000);
+    TLOG(LL_ERR, "good level");
+    TLOG(LL_INFO, "filtered");
+    std::string text = messages();
+    EXPECT_EQ(text.find("bad level"), std::string::npos);
+    EXPECT_NE(text.find("good level"), std::string::npos);
+    EXPECT_EQ(text.find("filtered"), std::string::npos);
+}
+
+TEST_F(Log_Test, ClosedLogCostsACheck)
+{
+    // Without a file, a burst of messages makes at most one look.
+    for (int i = 0; i < 100000; i++)
+        TLOG(LL_ERR, "off %d", i);
+    EXPECT_FALSE(log_wanted(LL_FATAL));
+    EXPECT_FALSE(exists(".tessel"));
+
+    // An open log filters by its level without a lock or a look.
+    rc("LOG_LEVEL=WARN\n");
+    close_log();
+    TLOG(LL_WARN, "open");
+    EXPECT_TRUE(log_wanted(LL_WARN));
+    EXPECT_FALSE(log_wanted(LL_INFO));
+    ASSERT_EQ(log_set_level("DBG"), 0);
+    EXPECT_TRUE(log_wanted(LL_DBG));
 }
 
 TEST_F(Log_Test, OpenLogIgnoresConfigChangesUntilClosed)

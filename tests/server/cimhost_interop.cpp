@@ -5,6 +5,8 @@
 
 #include <gtest/gtest.h>
 #include <dlfcn.h>
+#include <unistd.h>
+#include <fstream>
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
@@ -253,7 +255,34 @@ TEST_F(Interop, ObjectManagerAndNamespaceTakeTheServersAnswer)
 
 TEST_F(Interop, ServerThatCantBeAskedIsCalledCIMServer)
 {
-    host->set_interop(false);
+    // Neither interop namespace may answer: not the stand-in, and not the
+    // module's own registrations in root/interop.
+    std::string reg = "/tmp/vspr_interop_" + std::to_string(getpid()) + ".reg";
+    {
+        std::ifstream in(VSPR_SOURCE_DIR "/schema/vsprprovider.reg");
+        std::ofstream out(reg);
+        std::string line;
+        while (std::getline(in, line))
+        {
+            size_t at = line.find(" root/interop");
+            out << (at == std::string::npos ? line : line.substr(0, at)) << "\n";
+        }
+    }
+    ch::Options o;
+    o.reg_path = reg;
+    o.interop = false;
+    delete host;
+    host = new ch::Host(o);
+    unlink(reg.c_str());
+    ASSERT_TRUE(host->ok()) << host->error();
+    struct Restore
+    {
+        ~Restore()
+        {
+            delete host;
+            host = new ch::Host(ch::Options());
+        }
+    } restore;
     ch::Result om = served("VESPERA_ObjectManager");
     ASSERT_EQ(om.instances.size(), 1u);
     for (const char* p : { "Name", "Caption", "Description", "ElementName" })

@@ -4,6 +4,7 @@
 
 #include <gtest/gtest.h>
 #include <algorithm>
+#include <fstream>
 #include <string>
 #include <vector>
 
@@ -346,4 +347,66 @@ TEST(ServerManagerInterop, ServerAnswerIsTakenFromItsFirstInstance)
     EXPECT_EQ(empty.open_enumerators, 0);
     // An empty answer is an answer: SFCB's namespace isn't asked.
     EXPECT_EQ(empty.asked_namespaces, std::vector<std::string>(2, "root/PG_InterOp"));
+}
+
+// A reference made while serving a request in the interop namespace points
+// where its instance answers: the profile classes in the request's own
+// namespace, everything else in root/vespera.
+TEST(ServerManager, ReferencesPointWhereTheirInstancesAnswer)
+{
+    Instances profiles(ServerManager::getServerManager()->getRegisteredProfileInstances());
+    Instances managers(ServerManager::getServerManager()->getObjectManagerInstance());
+    ASSERT_GT(profiles.size(), 0u);
+    ASSERT_EQ(managers.size(), 1u);
+    Instance* profile = profiles.array[0];
+    Instance* manager = managers.array[0];
+
+    struct { const char* request; const char* profile; const char* manager; } rows[] =
+    {
+        { "root/interop", "", "root/vespera" },
+        { "root/PG_InterOp", "", "root/vespera" },
+        { "root/vespera", "root/elsewhere", "root/elsewhere" },
+        { "ROOT/Vespera", "root/elsewhere", "root/elsewhere" },
+        { "", "root/elsewhere", "root/elsewhere" },
+    };
+    for (const auto& row : rows)
+    {
+        // A namespace the references may carry already: in root/vespera
+        // nothing moves them.
+        profile->__name_space.assign("root/elsewhere");
+        manager->__name_space.assign("root/elsewhere");
+        ServerManager::placeReference(profile, String(row.request));
+        ServerManager::placeReference(manager, String(row.request));
+        EXPECT_STREQ(row.profile, profile->__name_space.c_str()) << row.request;
+        EXPECT_STREQ(row.manager, manager->__name_space.c_str()) << row.request;
+    }
+    ServerManager::placeReference(0, String("root/interop"));
+}
+
+// The classes ServerManager places in the interop namespace are the ones
+// registered there.
+TEST(ServerManager, InteropClassesAreTheRegisteredOnes)
+{
+    std::ifstream reg(VSPR_SOURCE_DIR "/schema/vsprprovider.reg");
+    ASSERT_TRUE(reg.good());
+    std::string line, cls;
+    size_t classes = 0, interop = 0;
+    while (std::getline(reg, line))
+    {
+        if (line.size() > 2 && line[0] == '[')
+        {
+            cls = line.substr(1, line.find(']') - 1);
+            classes++;
+        }
+        else if (line.find("namespace:") != std::string::npos)
+        {
+            bool registered = line.find(" root/interop") != std::string::npos;
+            interop += registered;
+            EXPECT_EQ(registered, ServerManager::isServedInInterop(cls.c_str())) << cls;
+        }
+    }
+    EXPECT_EQ(76u, classes);
+    EXPECT_GT(interop, 0u);
+    EXPECT_TRUE(ServerManager::isServedInInterop("vespera_registeredprofile"));
+    EXPECT_FALSE(ServerManager::isServedInInterop(0));
 }
