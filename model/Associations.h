@@ -126,7 +126,8 @@ public:
         _proc(handler ? handler->proc : 0),
         _client_data(handler ? handler->client_data : 0),
         _open(handler != 0),
-        _sent(0)
+        _sent(0),
+        _place(0)
     {
     }
 
@@ -168,8 +169,8 @@ public:
 
             Instance* copy = clone(end);
 
-            if (_ends_name_space.size())
-                copy->__name_space = _ends_name_space;
+            if (_place)
+                _place(copy, _request_name_space);
 
             *(Instance**)__slot(association, mr->offset) = copy;
             filled++;
@@ -188,9 +189,16 @@ public:
         return _open;
     }
 
-    // The ends of later associations name this namespace; by default they
-    // name none, which stands for the request's.
-    void placeEndsIn(const String& nameSpace) { _ends_name_space = nameSpace; }
+    // Lets place set the namespace of each end of later associations, made
+    // for a request in requestNamespace. By default an end names none, which
+    // stands for the request's.
+    typedef void (*Place)(Instance* end, const String& requestNamespace);
+
+    void placeEnds(Place place, const String& requestNamespace)
+    {
+        _place = place;
+        _request_name_space = requestNamespace;
+    }
 
     bool open() const { return _open; }
     size_t sent() const { return _sent; }
@@ -202,7 +210,8 @@ private:
     void* _client_data;
     bool _open;
     size_t _sent;
-    String _ends_name_space;
+    Place _place;
+    String _request_name_space;
 
     Association_Sender(const Association_Sender&);
     Association_Sender& operator=(const Association_Sender&);

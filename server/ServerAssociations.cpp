@@ -1,8 +1,9 @@
 // The associations of the interop model: the object manager and what it
 // serves, and the profiles with what implements them.
 //
-// These classes are served in more than one namespace, so their ends name
-// the namespace of the request rather than a fixed one.
+// These classes are served in the interop namespace as well as the
+// module's own, so each end names the namespace where its class answers:
+// the request's for an interop class, the module's for the host.
 
 #include "Associations.h"
 #include "ServerManager.h"
@@ -28,7 +29,7 @@ Array<Instance*> fetchServerInstances(classId_t id)
     return ServerManager::getServerManager()->getInstances(id);
 }
 
-// The enumeration of a server association, its ends placed in the
+// The enumeration of a server association; the model carries the
 // request's namespace.
 template<class A, class Body>
 Enum_Instances_Status enumServerAssociation(const A* model, Enum_Instances_Handler<A>* handler,
@@ -37,7 +38,7 @@ Enum_Instances_Status enumServerAssociation(const A* model, Enum_Instances_Handl
     String nameSpace = model ? model->__name_space : String();
 
     return enumAssociation(handler, [&](Association_Sender& out) {
-        out.placeEndsIn(nameSpace);
+        out.placeEnds(ServerManager::placeReference, nameSpace);
         return body(out);
     });
 }
