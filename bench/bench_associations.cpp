@@ -3,17 +3,21 @@
 //
 //   bench_associations [--seconds S]
 //
-// On generated hosts of some 1,000, 8,000 and 32,000 LUNs (4 adapters of 2
-// FC ports, 20 LUNs per disk target, one target in four a tape with two
-// units, and 8, 64 and 256 remote ports per port), it times:
+// On generated hosts of some 1,000, 8,000 and 32,000 LUNs (20 LUNs per disk
+// target, one target in four a tape with two units), grown two ways: deeper
+// ports (4 adapters of 2 FC ports, 8, 64 and 256 remote ports per port) and
+// more ports (4, 32 and 128 adapters of 2 FC ports, 8 remote ports each), it
+// times:
 //
 //   - ai of one initiator endpoint to its logical units, through
 //     VESPERA_SCSIInitiatorTargetLogicalUnitPath (result role LogicalUnit);
+//   - gi of the last storage extent of those units: ai asks the server for
+//     each unit so;
 //   - ai of one FC port to its adapter, through VESPERA_ControlledBy;
 //   - ein of VESPERA_SCSIInitiatorTargetLogicalUnitPath.
 //
-// Each runs at least three times and until S seconds (default 1) have
-// passed; the table gives the mean time of one, and that time per 1,000
+// Each runs at least once and until S seconds (default 1) have passed; the
+// table gives the mean time of one and, for the walks, that time per 1,000
 // LUNs of the host, which stays flat where the cost grows linearly. The
 // module's log is off.
 
@@ -27,6 +31,7 @@
 #include <cstring>
 #include <functional>
 #include <string>
+#include <vector>
 
 #include "cimhost.h"
 
@@ -35,12 +40,25 @@ namespace ch = OLMA::cimhost;
 namespace
 {
 
-std::string generateHost(const std::string& dir, int rports)
+struct Shape
 {
-    std::string file = dir + "/host-" + std::to_string(rports) + ".json";
+    const char* growth;
+    int adapters;
+    int rports;
+};
+
+const Shape shapes[] = {
+    { "deeper", 4, 8 }, { "deeper", 4, 64 }, { "deeper", 4, 256 },
+    { "wider", 4, 8 }, { "wider", 32, 8 }, { "wider", 128, 8 },
+};
+
+std::string generateHost(const std::string& dir, const Shape& shape)
+{
+    std::string file = dir + "/host-" + std::to_string(shape.adapters) + "-" +
+        std::to_string(shape.rports) + ".json";
     std::string cmd = std::string("python3 '") + VSPR_SOURCE_DIR + "/tools/gen_host.py'" +
-        " --adapters 4 --ports 2 --luns 20 --cna-every 0 --rports " + std::to_string(rports) +
-        " -o '" + file + "'";
+        " --adapters " + std::to_string(shape.adapters) + " --ports 2 --luns 20 --cna-every 0" +
+        " --rports " + std::to_string(shape.rports) + " -o '" + file + "'";
     return system(cmd.c_str()) == 0 ? file : "";
 }
 
@@ -79,7 +97,7 @@ Timing timeIt(double minSeconds, const std::function<ch::Result()>& op)
         runs++;
         seconds = std::chrono::duration<double>(std::chrono::steady_clock::now() - start).count();
     }
-    while (runs < 3 || seconds < minSeconds);
+    while (seconds < minSeconds);
     t.ms = seconds / runs * 1000;
     return t;
 }
@@ -120,7 +138,6 @@ int main(int argc, char** argv)
         return 1;
     }
 
-    const int rports[] = { 8, 64, 256 };
     int status = 0;
     {
         ch::Host host;
@@ -130,25 +147,27 @@ int main(int argc, char** argv)
             return 1;
         }
 
-        printf("%7s | %-28s | %-28s | %-28s\n", "", "ai initiator -> its LUNs",
-            "ai FC port -> adapter", "ein initiator-target-LUN");
-        printf("%7s | %8s %9s %9s | %8s %9s %9s | %8s %9s %9s\n", "LUNs",
-            "results", "ms", "ms/1000", "results", "ms", "ms/1000", "results", "ms", "ms/1000");
+        printf("%-7s %7s %6s | %-27s %9s | %-18s | %-27s\n", "", "", "",
+            "ai initiator -> its LUNs", "gi extent", "ai port -> adapter", "ein paths");
+        printf("%-7s %7s %6s | %7s %9s %9s %9s | %8s %9s | %7s %9s %9s\n", "growth", "LUNs",
+            "ports", "results", "ms", "ms/1000", "ms", "results", "ms", "results", "ms",
+            "ms/1000");
 
-        for (int r : rports)
+        for (const Shape& shape : shapes)
         {
-            std::string file = generateHost(dir, r);
+            std::string file = generateHost(dir, shape);
             setenv("DTRUJ_HOST", file.c_str(), 1);
             if (file.empty() || reset() != 0)
             {
-                fprintf(stderr, "bench_associations: no host of %d remote ports\n", r);
+                fprintf(stderr, "bench_associations: no host of %d adapters, %d remote ports\n",
+                    shape.adapters, shape.rports);
                 status = 1;
                 continue;
             }
 
             size_t luns = host.ein(classPath("VESPERA_StorageExtent")).paths.size() +
                 host.ein(classPath("VESPERA_TapeDrive")).paths.size();
-            ch::Object_Path port = host.ein(classPath("VESPERA_FCPort")).paths.at(0);
+            std::vector<ch::Object_Path> ports = host.ein(classPath("VESPERA_FCPort")).paths;
             ch::Object_Path initiator;
             for (const ch::Instance& e : host.ei(classPath("VESPERA_SCSIProtocolEndpoint")).instances)
                 if (e.get_text("Role") == "2")
@@ -156,23 +175,37 @@ int main(int argc, char** argv)
                     initiator = e.path;
                     break;
                 }
+            std::vector<ch::Object_Path> units = host.an(initiator,
+                "VESPERA_SCSIInitiatorTargetLogicalUnitPath", "", "", "LogicalUnit").paths;
+            if (ports.empty() || units.empty())
+            {
+                fprintf(stderr, "bench_associations: no port or unit\n");
+                status = 1;
+                continue;
+            }
 
-            Timing units = timeIt(minSeconds, [&]() {
+            Timing toUnits = timeIt(minSeconds, [&]() {
                 return host.ai(initiator, "VESPERA_SCSIInitiatorTargetLogicalUnitPath", "", "",
                     "LogicalUnit");
             });
-            Timing adapter = timeIt(minSeconds, [&]() {
-                return host.ai(port, "VESPERA_ControlledBy");
+            ch::Object_Path lastExtent = units.back();
+            for (const ch::Object_Path& u : units)
+                if (u.class_name == "VESPERA_StorageExtent")
+                    lastExtent = u;
+            Timing oneUnit = timeIt(minSeconds / 4, [&]() { return host.gi(lastExtent); });
+            Timing toAdapter = timeIt(minSeconds, [&]() {
+                return host.ai(ports[0], "VESPERA_ControlledBy");
             });
             Timing paths = timeIt(minSeconds, [&]() {
                 return host.ein(classPath("VESPERA_SCSIInitiatorTargetLogicalUnitPath"));
             });
-            status |= !(units.ok && adapter.ok && paths.ok);
+            status |= !(toUnits.ok && oneUnit.ok && toAdapter.ok && paths.ok);
 
             double k = luns / 1000.0;
-            printf("%7zu | %8zu %9.2f %9.3f | %8zu %9.2f %9.3f | %8zu %9.2f %9.3f\n", luns,
-                units.results, units.ms, units.ms / k, adapter.results, adapter.ms,
-                adapter.ms / k, paths.results, paths.ms, paths.ms / k);
+            printf("%-7s %7zu %6zu | %7zu %9.2f %9.3f %9.3f | %8zu %9.2f | %7zu %9.2f %9.3f\n",
+                shape.growth, luns, ports.size(), toUnits.results, toUnits.ms, toUnits.ms / k,
+                oneUnit.ms, toAdapter.results, toAdapter.ms, paths.results, paths.ms,
+                paths.ms / k);
             fflush(stdout);
             unlink(file.c_str());
         }
