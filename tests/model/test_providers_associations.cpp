@@ -152,6 +152,29 @@ TEST_F(AssociationCases, AnFCPortWithoutAnAssociationClassNamed)
         labelsOf(r.paths));
 }
 
+// The profiles answer in the interop namespace too: there, what a profile
+// leads to names the namespace where it answers, the module's for the host.
+TEST_F(AssociationCases, FromTheInteropNamespaceToTheHost)
+{
+    ch::Object_Path fcHba;
+    std::string err;
+    ASSERT_TRUE(host->parse_object_path(
+        "root/interop:VESPERA_RegisteredProfile.InstanceID=\"FC HBA\"", fcHba, err)) << err;
+
+    ch::Result r = host->an(fcHba, "VESPERA_ElementConformsToProfile");
+    ASSERT_TRUE(r.ok()) << rcText(r);
+    std::map<std::string, std::string> where;
+    for (const ch::Object_Path& p : r.paths)
+        where[p.class_name] = p.name_space;
+    EXPECT_EQ((std::map<std::string, std::string>{
+        {"VESPERA_ComputerSystem", "root/vespera"}, {"VESPERA_RegisteredProfile", "root/interop"}}),
+        where);
+
+    r = host->ai(fcHba, "VESPERA_ElementConformsToProfile");
+    ASSERT_TRUE(r.ok()) << rcText(r);
+    EXPECT_EQ(2u, r.instances.size());
+}
+
 // A port whose node has no WWN has no group; the other ports keep theirs,
 // and the log says which port was left out. With no group at all the
 // enumeration fails, and the operations with it.
