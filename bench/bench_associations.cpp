@@ -169,7 +169,8 @@ int main(int argc, char** argv)
                 host.ein(classPath("VESPERA_TapeDrive")).paths.size();
             std::vector<ch::Object_Path> ports = host.ein(classPath("VESPERA_FCPort")).paths;
             ch::Object_Path initiator;
-            for (const ch::Instance& e : host.ei(classPath("VESPERA_SCSIProtocolEndpoint")).instances)
+            ch::Result endpoints = host.ei(classPath("VESPERA_SCSIProtocolEndpoint"));
+            for (const ch::Instance& e : endpoints.instances)
                 if (e.get_text("Role") == "2")
                 {
                     initiator = e.path;

@@ -365,7 +365,8 @@ bool connectorPlace(const VESPERA_PhysicalConnector* connector, int& adapterId, 
 } // namespace
 
 Enum_Instances_Status VESPERA_EthernetPortRealizes_Provider::enum_instances(
-    const VESPERA_EthernetPortRealizes*, Enum_Instances_Handler<VESPERA_EthernetPortRealizes>* handler)
+    const VESPERA_EthernetPortRealizes*,
+    Enum_Instances_Handler<VESPERA_EthernetPortRealizes>* handler)
 {
     return enumAssociation(handler, [](Association_Sender& out) {
         Instance_List connectors(fetchInstances(ID_VESPERA_PhysicalConnector));

@@ -94,7 +94,8 @@ Enum_Instances_Status VESPERA_FCPortSystemDevice_Provider::enum_instances(
     const VESPERA_FCPortSystemDevice*, Enum_Instances_Handler<VESPERA_FCPortSystemDevice>* handler)
 {
     return enumAssociation(handler, [](Association_Sender& out) {
-        return sendFirstSystemWithEach(out, ID_VESPERA_FCPort, "Error: Invalid mapping information");
+        return sendFirstSystemWithEach(out, ID_VESPERA_FCPort,
+            "Error: Invalid mapping information");
     });
 }
 

@@ -146,7 +146,8 @@ inline Labels labelsOf(const std::vector<ch::Instance>& instances)
 }
 
 // The pairs of an association path list: every role must be a reference.
-inline std::vector<Pair> pairsOf(const Association_Row& row, const std::vector<ch::Object_Path>& paths)
+inline std::vector<Pair> pairsOf(const Association_Row& row,
+    const std::vector<ch::Object_Path>& paths)
 {
     std::vector<Pair> pairs;
     for (const ch::Object_Path& a : paths)
@@ -316,7 +317,9 @@ inline Labels expectedPairs(World& w, const std::string& cls)
         return std::string("PhysicalPackage:?");
     };
     auto system = [&]() { return Labels{w.one("VESPERA_ComputerSystem")}; };
-    auto withSystem = [&](const char* partClass) { allWithAll(out, system(), w.labels(partClass)); };
+    auto withSystem = [&](const char* partClass) {
+        allWithAll(out, system(), w.labels(partClass));
+    };
 
     if (cls == "VESPERA_PortControllerSystemDevice")
         withSystem("VESPERA_PortController");
@@ -375,9 +378,12 @@ inline Labels expectedPairs(World& w, const std::string& cls)
         for (const char* s : {"fc initiator ports", "software update", "software inventory",
                  "access points", "physical asset", "ethernet port", "diagnostics profile",
                  "host lan network port"})
-            out.push_back(join({"RegisteredProfile:fc hba", std::string("RegisteredSubProfile:") + s}));
-        out.push_back(join({"RegisteredProfile:server", "RegisteredSubProfile:profile registration"}));
-        out.push_back(join({"RegisteredProfile:storage hba", "RegisteredSubProfile:fcoe initiator ports"}));
+            out.push_back(join({"RegisteredProfile:fc hba",
+                std::string("RegisteredSubProfile:") + s}));
+        out.push_back(join({"RegisteredProfile:server",
+            "RegisteredSubProfile:profile registration"}));
+        out.push_back(join({"RegisteredProfile:storage hba",
+            "RegisteredSubProfile:fcoe initiator ports"}));
     }
     else if (cls == "VESPERA_AssociatedAlarm")
     {
@@ -496,14 +502,16 @@ inline Labels expectedPairs(World& w, const std::string& cls)
             w.tests({"VESPERA_MemoryDiagnosticTest", "VESPERA_LoopbackDiagnosticTest",
                 "VESPERA_PCILoopbackDiagnosticTest", "VESPERA_EthLoopbackDiagnosticTest"}));
     else if (cls == "VESPERA_AvailableDiagnosticServiceForAdapter")
-        allWithAll(out, w.tests({"VESPERA_MemoryDiagnosticTest"}), w.labels("VESPERA_PortController"));
+        allWithAll(out, w.tests({"VESPERA_MemoryDiagnosticTest"}),
+            w.labels("VESPERA_PortController"));
     else if (cls == "VESPERA_AvailableDiagnosticServiceForEthernetPort")
         allWithAll(out, w.tests({"VESPERA_EthLoopbackDiagnosticTest",
             "VESPERA_PCILoopbackDiagnosticTest"}), w.labels("VESPERA_EthernetPort"));
     else if (cls == "VESPERA_AvailableDiagnosticServiceForFCPort")
     {
         // A CNA's ports don't loop back inside the adapter.
-        Labels tests = w.tests({"VESPERA_LoopbackDiagnosticTest", "VESPERA_PCILoopbackDiagnosticTest"});
+        Labels tests = w.tests({"VESPERA_LoopbackDiagnosticTest",
+            "VESPERA_PCILoopbackDiagnosticTest"});
         for (const Described_Adapter& a : w.adapters)
             for (const Described_Port& p : a.fc)
                 for (const std::string& t : tests)

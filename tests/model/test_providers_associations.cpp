@@ -50,7 +50,8 @@ Json::Value description(Host_Kind kind)
     switch (kind)
     {
         case CONVERGED_HOST: return convergedHost();
-        case MEZZANINE_HOST: return parseJson(readFile(std::string(DTRUJ_HOSTS_DIR) + "/mezzanine.json"));
+        case MEZZANINE_HOST:
+            return parseJson(readFile(std::string(DTRUJ_HOSTS_DIR) + "/mezzanine.json"));
         default: return defaultHost();
     }
 }
@@ -137,8 +138,9 @@ TEST_F(AssociationCases, AnFCPortWithoutAnAssociationClassNamed)
 
     ch::Result r = host->an(port);
     ASSERT_TRUE(r.ok()) << rcText(r);
+    std::string system = lower(served("VESPERA_ComputerSystem")[0].get_text("Name"));
     Labels want = {
-        "AlarmDevice:100000051e8a1001", "ComputerSystem:" + lower(served("VESPERA_ComputerSystem")[0].get_text("Name")),
+        "AlarmDevice:100000051e8a1001", "ComputerSystem:" + system,
         "FCPortStatistics:100000051e8a1001", "LogicalPortGroup:200000051e8a1000",
         "LoopbackDiagnosticTest:vespera:externalloopbacktest",
         "LoopbackDiagnosticTest:vespera:internalloopbacktest",
@@ -198,7 +200,8 @@ TEST_F(AssociationCases, PortsOfANodeWithoutGroup)
     EXPECT_EQ(CMPI_RC_ERR_FAILED, ein("VESPERA_MemberOfCollection").rc);
     EXPECT_EQ(CMPI_RC_ERR_FAILED, host->an(ein("VESPERA_FCPort").paths.at(0),
         "VESPERA_MemberOfCollection").rc);
-    EXPECT_EQ(2u, countLines(failed.text(), {"ERR", "Error: Invalid number of instances returned!"}));
+    EXPECT_EQ(2u, countLines(failed.text(),
+        {"ERR", "Error: Invalid number of instances returned!"}));
 }
 
 // Two walks of one host that disagree fail the association, with the reason
