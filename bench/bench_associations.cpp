@@ -11,8 +11,9 @@
 //
 //   - ai of one initiator endpoint to its logical units, through
 //     VESPERA_SCSIInitiatorTargetLogicalUnitPath (result role LogicalUnit);
-//   - gi of the last storage extent of those units: ai asks the server for
-//     each unit so;
+//   - gi of the last storage extent of those units: what a client pays to
+//     fetch one unit by its path (associators of the path class come
+//     whole from its provider, not unit by unit through the server);
 //   - ai of one FC port to its adapter, through VESPERA_ControlledBy;
 //   - ein of VESPERA_SCSIInitiatorTargetLogicalUnitPath.
 //

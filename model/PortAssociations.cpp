@@ -5,6 +5,7 @@
 #include <cstdio>
 
 #include "Associations.h"
+#include "Provider_Handle.h"
 
 #include "VESPERA_AlarmDevice.h"
 #include "VESPERA_FCPort.h"
@@ -300,6 +301,72 @@ Enum_Instances_Status VESPERA_SCSIInitiatorTargetLogicalUnitPath_Provider::enum_
 
         return ENUM_INSTANCES_OK;
     });
+}
+
+namespace
+{
+
+// What the associators' walk needs of one request, and what it has sent.
+struct Path_Associators
+{
+    const Instance* source;
+    const char* result_class;
+    const char* role;
+    const char* result_role;
+    Enum_Associators_Handler<Instance>* handler;
+    bool open;
+};
+
+// Each path that holds the source gives its other ends, as the bridge's own
+// walk would pair them; the handler takes a reference of each.
+bool sendOtherEnds(Instance* path, Enum_Instances_Status, void* client_data)
+{
+    Path_Associators* walk = (Path_Associators*)client_data;
+
+    if (!path)
+        return false;
+
+    if (walk->open)
+    {
+        Array<const Instance*> ends;
+        ssize_t n = get_associators(walk->source, path, walk->result_class, walk->role,
+            walk->result_role, ends);
+
+        for (ssize_t i = 0; i < n && walk->open; i++)
+        {
+            Instance* end = (Instance*)ends[i];
+            ref(end);
+            walk->open = walk->handler->handle(end);
+        }
+    }
+
+    destroy(path);
+    return walk->open;
+}
+
+} // namespace
+
+Enum_Associators_Status VESPERA_SCSIInitiatorTargetLogicalUnitPath_Provider::enum_associators(
+    const Instance* instance, const String& result_class, const String& role,
+    const String& result_role, Enum_Associators_Handler<Instance>* handler)
+{
+    if (!instance || !handler)
+        return ENUM_ASSOCIATORS_FAILED;
+
+    Path_Associators walk = { instance, result_class.c_str(), role.c_str(),
+        result_role.c_str(), handler, true };
+    Enum_Instances_Handler<VESPERA_SCSIInitiatorTargetLogicalUnitPath> paths(
+        &sendOtherEnds, &walk);
+
+    switch (enum_instances(0, &paths))
+    {
+        case ENUM_INSTANCES_OK:
+            return ENUM_ASSOCIATORS_OK;
+        case ENUM_INSTANCES_ACCESS_DENIED:
+            return ENUM_ASSOCIATORS_ACCESS_DENIED;
+        default:
+            return ENUM_ASSOCIATORS_FAILED;
+    }
 }
 
 } // namespace OLMA
