@@ -39,10 +39,23 @@ function(vspr_tests)
     # property would be split apart by gtest_discover_tests.
     target_compile_definitions(${exe} PRIVATE
       VSPR_BUILD_DIR="${CMAKE_BINARY_DIR}" VSPR_SOURCE_DIR="${CMAKE_SOURCE_DIR}")
-    if(ARG_PROPERTIES)
-      gtest_discover_tests(${exe} DISCOVERY_TIMEOUT 60 PROPERTIES ${ARG_PROPERTIES})
-    else()
-      gtest_discover_tests(${exe} DISCOVERY_TIMEOUT 60)
-    endif()
+    vspr_discover_tests(${exe} PROPERTIES ${ARG_PROPERTIES})
   endforeach()
+endfunction()
+
+# vspr_discover_tests(EXE [PREFIX p] [PROPERTIES ...]): the executable's tests
+# for CTest. A test whose name holds "WithAgentRunning" starts a process
+# named like the console agent, which every test that reads the process list
+# (any test of the remote access point, directly or through an association)
+# would see: such a test runs alone, and the others side by side.
+function(vspr_discover_tests exe)
+  cmake_parse_arguments(ARG "" "PREFIX" "PROPERTIES" ${ARGN})
+  set(props ${ARG_PROPERTIES})
+  if(NOT props)
+    set(props TIMEOUT 300)
+  endif()
+  gtest_discover_tests(${exe} DISCOVERY_TIMEOUT 60 TEST_PREFIX "${ARG_PREFIX}"
+    TEST_FILTER "-*WithAgentRunning*" PROPERTIES ${props})
+  gtest_discover_tests(${exe} DISCOVERY_TIMEOUT 60 TEST_PREFIX "${ARG_PREFIX}"
+    TEST_FILTER "*WithAgentRunning*" PROPERTIES ${props} RUN_SERIAL TRUE)
 endfunction()

@@ -106,7 +106,7 @@ static bool _class_is_named(const Meta_Class* mc, const char* name)
 
 ssize_t get_associators(const Instance* inst, const Instance* assoc_inst,
     const char* result_class, const char* role, const char* result_role,
-    const Instance* associators[])
+    Array<const Instance*>& associators)
 {
     const Meta_Class* mc = assoc_inst->meta_class;
 
@@ -115,6 +115,7 @@ ssize_t get_associators(const Instance* inst, const Instance* assoc_inst,
 
     bool found = false;
     ssize_t count = 0;
+    size_t before = associators.size();
 
     for (size_t i = 0; i < mc->num_meta_features; i++)
     {
@@ -130,7 +131,8 @@ ssize_t get_associators(const Instance* inst, const Instance* assoc_inst,
 
         const Instance* value = *(const Instance* const*)__slot(assoc_inst, mr->offset);
 
-        // Providers must fill every reference; an empty one is no end.
+        // A reference whose element has gone since the association was
+        // made is no end, and can't be the source either.
         if (!value)
             continue;
 
@@ -147,11 +149,15 @@ ssize_t get_associators(const Instance* inst, const Instance* assoc_inst,
         if (result_role && *result_role && strcasecmp(result_role, mr->name) != 0)
             continue;
 
-        if (count < 16)
-            associators[count++] = value;
+        associators.append(value);
+        count++;
     }
 
-    return found ? count : -1;
+    if (found)
+        return count;
+
+    associators.remove(before, associators.size() - before);
+    return -1;
 }
 
 bool is_reference_of(const Instance* inst, const Instance* assoc_inst, const char* role)
@@ -197,7 +203,7 @@ namespace _enum_associator_names
         if (!instance)
             return false;
 
-        const Instance* ends[16];
+        Array<const Instance*> ends;
         ssize_t n = get_associators(data->source, instance, data->result_class->c_str(),
             data->role->c_str(), data->result_role->c_str(), ends);
 

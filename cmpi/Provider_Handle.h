@@ -63,15 +63,16 @@ private:
 };
 
 // The other ends of the association instance as seen from the source
-// instance, filtered: their number (at most 16 are stored), or -1 if the
-// association doesn't refer to the source. The ends stay owned by the
-// association.
+// instance, filtered and appended to associators: their number, or -1 if
+// the association doesn't refer to the source. The ends stay owned by the
+// association. An empty reference (its element gone) is neither the source
+// nor an end.
 ssize_t get_associators(const Instance* inst, const Instance* assoc_inst,
     const char* result_class, const char* role, const char* result_role,
-    const Instance* associators[]);
+    Array<const Instance*>& associators);
 
 // Whether one of the association's references points at the instance, by
-// the role if one is given.
+// the role if one is given. Empty references are passed over.
 bool is_reference_of(const Instance* inst, const Instance* assoc_inst, const char* role);
 
 } // namespace OLMA

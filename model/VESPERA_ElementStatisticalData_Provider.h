@@ -1,13 +1,20 @@
 #ifndef _VESPERA_ElementStatisticalData_Provider_h
 #define _VESPERA_ElementStatisticalData_Provider_h
 
+#include "Provider.h"
+#include "VESPERA_ElementStatisticalData.h"
+
 namespace OLMA
 {
 
-// Serves VESPERA_ElementStatisticalData. Until its data source is wired it has no instances and
-// supports no other operation.
+// Serves VESPERA_ElementStatisticalData: each FC port with its statistics. Enumeration
+// only; the bridge walks the associations.
 class VESPERA_ElementStatisticalData_Provider
 {
+public:
+
+    Enum_Instances_Status enum_instances(
+        const VESPERA_ElementStatisticalData* model, Enum_Instances_Handler<VESPERA_ElementStatisticalData>* handler);
 };
 
 } // namespace OLMA

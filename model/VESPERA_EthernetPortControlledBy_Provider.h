@@ -1,13 +1,20 @@
 #ifndef _VESPERA_EthernetPortControlledBy_Provider_h
 #define _VESPERA_EthernetPortControlledBy_Provider_h
 
+#include "Provider.h"
+#include "VESPERA_EthernetPortControlledBy.h"
+
 namespace OLMA
 {
 
-// Serves VESPERA_EthernetPortControlledBy. Until its data source is wired it has no instances and
-// supports no other operation.
+// Serves VESPERA_EthernetPortControlledBy: each converged adapter with its Ethernet
+// ports. Enumeration only; the bridge walks the associations.
 class VESPERA_EthernetPortControlledBy_Provider
 {
+public:
+
+    Enum_Instances_Status enum_instances(
+        const VESPERA_EthernetPortControlledBy* model, Enum_Instances_Handler<VESPERA_EthernetPortControlledBy>* handler);
 };
 
 } // namespace OLMA

@@ -1,13 +1,20 @@
 #ifndef _VESPERA_Realizes_Provider_h
 #define _VESPERA_Realizes_Provider_h
 
+#include "Provider.h"
+#include "VESPERA_Realizes.h"
+
 namespace OLMA
 {
 
-// Serves VESPERA_Realizes. Until its data source is wired it has no instances and
-// supports no other operation.
+// Serves VESPERA_Realizes: each card with the adapter it realizes. Enumeration only; the
+// bridge walks the associations.
 class VESPERA_Realizes_Provider
 {
+public:
+
+    Enum_Instances_Status enum_instances(
+        const VESPERA_Realizes* model, Enum_Instances_Handler<VESPERA_Realizes>* handler);
 };
 
 } // namespace OLMA

@@ -1,24 +1,19 @@
 // vspr-inventory: the host's adapters, ports and what the ports reach, as a
 // WBEM client sees them through the provider module.
 //
-// The module is loaded into the stand-in CIM server, every inventory class
-// is enumerated once, and the elements are put together by what their keys
-// and properties share, since a client without associations has nothing
-// else to go by:
-//
-// - an FC port belongs to the adapter whose DeviceID is its node WWN (the
-//   first half of its Name), or, for a CNA named by MAC, whose MAC is the
-//   low six bytes of that node WWN;
-// - an Ethernet port belongs to the CNA with the nearest MAC at or below its
-//   own, within one block of 256 addresses;
-// - a target endpoint is named "<port>_<remote port>", and a logical unit's
-//   DeviceID starts with that name;
-// - a connector's Tag ends in "_<adapter>_<port place>", the adapter counted
-//   from 1 in the order of the enumeration.
+// The module is loaded into the stand-in CIM server. Every class shown is
+// enumerated once, and every association that ties them together once, by
+// name: the host's adapters, each adapter's card, software and ports, each
+// port's beacon and initiator, and the paths from an initiator through its
+// targets to their logical units. An element is then found by the object
+// path that an association names, as a client would follow a reference;
+// only the connector of a port is told by the end of its Tag, which carries
+// the port's place, among the connectors that the card holds.
 
 #include <dlfcn.h>
 #include <stdlib.h>
 
+#include <algorithm>
 #include <cstdio>
 #include <cstring>
 #include <iostream>
@@ -45,16 +40,109 @@ struct Inventory
 
     Instances ei(const std::string& cls)
     {
+        return call(cls, false).instances;
+    }
+
+    // The associations of a class, as paths whose keys are their ends.
+    std::vector<ch::Object_Path> ein(const std::string& cls)
+    {
+        return call(cls, true).paths;
+    }
+
+private:
+
+    ch::Result call(const std::string& cls, bool names)
+    {
         ch::Object_Path path;
         path.name_space = "root/vespera";
         path.class_name = cls;
-        ch::Result r = host.ei(path);
+        ch::Result r = names ? host.ein(path) : host.ei(path);
         if (!r.ok())
             failures.push_back(cls + ": " + ch::rc_name(r.rc) +
                 (r.message.empty() ? "" : " (" + r.message + ")"));
-        return r.instances;
+        return r;
     }
 };
+
+std::string lower(std::string s)
+{
+    for (char& c : s)
+        if (c >= 'A' && c <= 'Z')
+            c = c - 'A' + 'a';
+    return s;
+}
+
+// An object path as one text, whatever the order of its keys: the same
+// element gives the same text wherever a path names it.
+std::string pathKey(const ch::Object_Path& path)
+{
+    std::vector<std::string> keys;
+    for (const ch::Property& k : path.keys)
+        keys.push_back(lower(k.name) + "=" + k.value.text());
+    std::sort(keys.begin(), keys.end());
+    std::string text = lower(path.class_name);
+    for (const std::string& k : keys)
+        text += "\n" + k;
+    return text;
+}
+
+// The enumerated elements by their paths.
+class Elements
+{
+public:
+    void add(const Instances& instances)
+    {
+        for (const ch::Instance& i : instances)
+            _byPath[pathKey(i.path)] = &i;
+    }
+
+    const ch::Instance* find(const ch::Object_Path& path) const
+    {
+        auto at = _byPath.find(pathKey(path));
+        return at == _byPath.end() ? 0 : at->second;
+    }
+
+private:
+    std::map<std::string, const ch::Instance*> _byPath;
+};
+
+// What one association class ties to each element: for the end named
+// `from`, the ends named `to`, in the order of the associations.
+class Links
+{
+public:
+    Links(const std::vector<ch::Object_Path>& associations, const char* from, const char* to)
+    {
+        for (const ch::Object_Path& a : associations)
+        {
+            const ch::Value* f = a.key(from);
+            const ch::Value* t = a.key(to);
+            if (f && f->ref && t && t->ref)
+                _ends[pathKey(*f->ref)].push_back(*t->ref);
+        }
+    }
+
+    const std::vector<ch::Object_Path>& of(const ch::Object_Path& element) const
+    {
+        static const std::vector<ch::Object_Path> none;
+        auto at = _ends.find(pathKey(element));
+        return at == _ends.end() ? none : at->second;
+    }
+
+private:
+    std::map<std::string, std::vector<ch::Object_Path> > _ends;
+};
+
+// The instances that the paths name, of those enumerated, in order.
+std::vector<const ch::Instance*> found(const Elements& elements,
+    const std::vector<ch::Object_Path>& paths)
+{
+    std::vector<const ch::Instance*> out;
+    for (const ch::Object_Path& p : paths)
+        if (const ch::Instance* i = elements.find(p))
+            out.push_back(i);
+    return out;
+}
 
 std::string text(const ch::Instance& i, const char* property)
 {
@@ -70,19 +158,6 @@ uint64_t number(const ch::Instance& i, const char* property)
     if (!v || v->null || v->is_array())
         return 0;
     return strtoull(v->text().c_str(), 0, 10);
-}
-
-std::string lower(std::string s)
-{
-    for (char& c : s)
-        if (c >= 'A' && c <= 'Z')
-            c = c - 'A' + 'a';
-    return s;
-}
-
-bool startsWith(const std::string& s, const std::string& prefix)
-{
-    return s.size() >= prefix.size() && s.compare(0, prefix.size(), prefix) == 0;
 }
 
 // "0x..." digits of a plain address, 0 if it isn't one.
@@ -134,38 +209,16 @@ std::string enabledText(uint64_t state)
     }
 }
 
-struct Lun
-{
-    const ch::Instance* instance;
-    bool tape;
-};
-
+// A target endpoint ("<port>_<remote port>") and its units on the paths.
 struct Target
 {
-    std::string remote;
-    std::vector<Lun> luns;
+    std::string name;
+    std::vector<const ch::Instance*> disks;
+    std::vector<const ch::Instance*> tapes;
 };
 
-struct FCPort
+void printUnit(const ch::Instance& i, bool tape)
 {
-    const ch::Instance* port;
-    std::string wwn;
-    std::string node;
-    std::vector<Target> targets;
-};
-
-struct Adapter
-{
-    const ch::Instance* controller;
-    const ch::Instance* package;
-    std::string id;
-    std::vector<FCPort*> fcPorts;
-    std::vector<const ch::Instance*> ethPorts;
-};
-
-void printUnit(const Lun& lun)
-{
-    const ch::Instance& i = *lun.instance;
     std::string device = text(i, "DeviceID");
     // "<port>_<remote>_<vendor>_<product>_LUN_<n>": the middle names the unit.
     std::string what;
@@ -178,7 +231,7 @@ void printUnit(const Lun& lun)
         if (ch == '_')
             ch = ' ';
 
-    printf("        %-4s %-7s %-24s %s\n", lun.tape ? "tape" : "disk",
+    printf("        %-4s %-7s %-24s %s\n", tape ? "tape" : "disk",
         text(i, "ElementName").c_str(), what.c_str(), text(i, "Name").c_str());
 }
 
@@ -227,13 +280,41 @@ int main(int argc, char** argv)
     Instances software = inv.ei("VESPERA_AdapterSoftwareIdentity");
     Instances fcPorts = inv.ei("VESPERA_FCPort");
     Instances alarms = inv.ei("VESPERA_AlarmDevice");
-    Instances endpoints = inv.ei("VESPERA_SCSIProtocolEndpoint");
-    Instances disks = inv.ei("VESPERA_LogicalDisk");
+    Instances extents = inv.ei("VESPERA_StorageExtent");
     Instances tapes = inv.ei("VESPERA_TapeDrive");
     Instances ethPorts = inv.ei("VESPERA_EthernetPort");
     Instances connectors = inv.ei("VESPERA_PhysicalConnector");
 
+    Elements elements;
+    for (const Instances* list : { &systems, &access, &controllers, &packages, &software,
+        &fcPorts, &alarms, &extents, &tapes, &ethPorts, &connectors })
+        elements.add(*list);
+
+    Links hostAdapters(inv.ein("VESPERA_PortControllerSystemDevice"),
+        "GroupComponent", "PartComponent");
+    Links hostAccess(inv.ein("VESPERA_RemoteServiceHostedAccessPoint"), "Antecedent", "Dependent");
+    Links hostSoftware(inv.ein("VESPERA_InstalledSoftwareIdentity"), "System", "InstalledSoftware");
+    Links hostFCPorts(inv.ein("VESPERA_FCPortSystemDevice"), "GroupComponent", "PartComponent");
+    Links hostEthPorts(inv.ein("VESPERA_EthernetPortSystemDevice"),
+        "GroupComponent", "PartComponent");
+    Links cards(inv.ein("VESPERA_Realizes"), "Dependent", "Antecedent");
+    Links adapterSoftware(inv.ein("VESPERA_AdapterElementSoftwareIdentity"),
+        "Dependent", "Antecedent");
+    Links adapterFCPorts(inv.ein("VESPERA_ControlledBy"), "Antecedent", "Dependent");
+    Links adapterEthPorts(inv.ein("VESPERA_EthernetPortControlledBy"), "Antecedent", "Dependent");
+    Links cardConnectors(inv.ein("VESPERA_PhysicalConnectorContainer"),
+        "GroupComponent", "PartComponent");
+    Links beacons(inv.ein("VESPERA_AssociatedAlarm"), "Dependent", "Antecedent");
+    Links initiators(inv.ein("VESPERA_DeviceSAPImplementation"), "Antecedent", "Dependent");
+    std::vector<ch::Object_Path> paths = inv.ein("VESPERA_SCSIInitiatorTargetLogicalUnitPath");
+
+    auto isDriver = [](const ch::Instance& sw) {
+        const ch::Value* cl = sw.get("Classifications");
+        return cl && !cl->null && !cl->elements.empty() && cl->elements[0].num.uint16 == 2;
+    };
+
     // The host.
+    const ch::Instance* host0 = systems.empty() ? 0 : &systems[0];
     if (systems.empty())
         printf("Host: (none answered)\n");
     for (const ch::Instance& s : systems)
@@ -244,193 +325,164 @@ int main(int argc, char** argv)
             how = " (" + d->elements[0].str + ")";
         printf("Host %s%s\n", text(s, "Name").c_str(), how.c_str());
     }
-    if (access.empty())
+    std::vector<const ch::Instance*> agents, drivers, adapters, hostPorts, hostEth;
+    if (host0)
+    {
+        agents = found(elements, hostAccess.of(host0->path));
+        drivers = found(elements, hostSoftware.of(host0->path));
+        adapters = found(elements, hostAdapters.of(host0->path));
+        hostPorts = found(elements, hostFCPorts.of(host0->path));
+        hostEth = found(elements, hostEthPorts.of(host0->path));
+    }
+    if (agents.empty())
         printf("  Console agent: not running\n");
-    for (const ch::Instance& a : access)
-        printf("  Console agent: %s\n", text(a, "AccessInfo").c_str());
-    for (const ch::Instance& sw : software)
-    {
-        const ch::Value* cl = sw.get("Classifications");
-        bool driver = cl && !cl->null && !cl->elements.empty() && cl->elements[0].num.uint16 == 2;
-        if (driver)
-            printf("  Driver %s %s\n", text(sw, "InstanceID").c_str(),
-                text(sw, "VersionString").c_str());
-    }
+    for (const ch::Instance* a : agents)
+        printf("  Console agent: %s\n", text(*a, "AccessInfo").c_str());
+    for (const ch::Instance* sw : drivers)
+        if (isDriver(*sw))
+            printf("  Driver %s %s\n", text(*sw, "InstanceID").c_str(),
+                text(*sw, "VersionString").c_str());
 
-    // Adapters, in the order of the enumeration.
-    std::vector<Adapter> adapters(controllers.size());
-    std::map<std::string, size_t> byId;
-    for (size_t i = 0; i < controllers.size(); i++)
+    // The targets of each initiator, and each target's units, in the order
+    // of the paths: a target is on as many paths as it has units.
+    std::map<std::string, std::vector<Target> > targetsOf;
+    for (const ch::Object_Path& p : paths)
     {
-        adapters[i].controller = &controllers[i];
-        adapters[i].package = 0;
-        adapters[i].id = lower(text(controllers[i], "DeviceID"));
-        byId[adapters[i].id] = i;
-        for (const ch::Instance& p : packages)
-            if (text(p, "SerialNumber") == text(controllers[i], "Name"))
-                adapters[i].package = &p;
-    }
-
-    // FC ports to adapters, targets to ports, units to targets.
-    std::vector<FCPort> ports(fcPorts.size());
-    std::vector<FCPort*> unattached;
-    std::map<std::string, FCPort*> portByWwn;
-    for (size_t i = 0; i < fcPorts.size(); i++)
-    {
-        FCPort& p = ports[i];
-        p.port = &fcPorts[i];
-        p.wwn = lower(text(fcPorts[i], "DeviceID"));
-        std::string name = text(fcPorts[i], "Name");
-        p.node = lower(name.substr(0, name.find(':')));
-        portByWwn[p.wwn] = &p;
-
-        auto a = byId.find(p.node);
-        if (a == byId.end() && p.node.size() == 16)
-            a = byId.find(p.node.substr(4));
-        if (a != byId.end())
-            adapters[a->second].fcPorts.push_back(&p);
-        else
-            unattached.push_back(&p);
-    }
-
-    for (const ch::Instance& e : endpoints)
-    {
-        std::string name = lower(text(e, "Name"));
-        size_t cut = name.find('_');
-        if (number(e, "Role") != 3 || cut == std::string::npos)
+        const ch::Value* i = p.key("Initiator");
+        const ch::Value* t = p.key("Target");
+        const ch::Value* u = p.key("LogicalUnit");
+        if (!i || !i->ref || !t || !t->ref || !u || !u->ref)
             continue;
-        auto p = portByWwn.find(name.substr(0, cut));
-        if (p == portByWwn.end())
+        const ch::Instance* unit = elements.find(*u->ref);
+        if (!unit)
             continue;
-        Target t;
-        t.remote = name.substr(cut + 1);
-        p->second->targets.push_back(t);
+        const ch::Value* name = t->ref->key("Name");
+        std::string target = name ? lower(name->str) : "";
+        std::vector<Target>& targets = targetsOf[pathKey(*i->ref)];
+        if (targets.empty() || targets.back().name != target)
+        {
+            targets.push_back(Target());
+            targets.back().name = target;
+        }
+        bool tape = lower(unit->class_name) == "vespera_tapedrive";
+        (tape ? targets.back().tapes : targets.back().disks).push_back(unit);
     }
 
-    auto placeUnits = [&](const Instances& units, bool tape) {
-        for (const ch::Instance& u : units)
-        {
-            std::string device = lower(text(u, "DeviceID"));
-            size_t a = device.find('_');
-            size_t b = a == std::string::npos ? a : device.find('_', a + 1);
-            if (b == std::string::npos)
-                continue;
-            auto p = portByWwn.find(device.substr(0, a));
-            if (p == portByWwn.end())
-                continue;
-            std::string remote = device.substr(a + 1, b - a - 1);
-            Target* target = 0;
-            for (Target& t : p->second->targets)
-                if (t.remote == remote)
-                    target = &t;
-            if (!target)
-            {
-                p->second->targets.push_back(Target());
-                target = &p->second->targets.back();
-                target->remote = remote;
-            }
-            target->luns.push_back(Lun{&u, tape});
-        }
-    };
-    placeUnits(disks, false);
-    placeUnits(tapes, true);
+    std::vector<std::string> shown;
 
-    // Ethernet ports to CNAs.
-    std::vector<const ch::Instance*> looseEth;
-    for (const ch::Instance& e : ethPorts)
-    {
-        uint64_t mac = addressValue(lower(text(e, "DeviceID")));
-        Adapter* best = 0;
-        uint64_t bestMac = 0;
-        for (Adapter& a : adapters)
-        {
-            uint64_t am = a.id.size() == 12 ? addressValue(a.id) : 0;
-            if (am && am <= mac && mac - am < 256 && am >= bestMac)
-            {
-                best = &a;
-                bestMac = am;
-            }
-        }
-        if (best)
-            best->ethPorts.push_back(&e);
-        else
-            looseEth.push_back(&e);
-    }
-
-    auto printFCPort = [&](const FCPort& p, size_t adapterNo) {
-        const ch::Instance& i = *p.port;
+    auto printFCPort = [&](const ch::Instance& i, const std::vector<const ch::Instance*>& optics) {
+        shown.push_back(pathKey(i.path));
+        std::string wwn = lower(text(i, "DeviceID"));
         std::string beacon = "no beacon";
-        for (const ch::Instance& a : alarms)
-            if (lower(text(a, "DeviceID")) == p.wwn)
-                beacon = number(a, "AlarmState") == 3 ? "beacon on" : "beacon off";
+        for (const ch::Instance* a : found(elements, beacons.of(i.path)))
+            beacon = number(*a, "AlarmState") == 3 ? "beacon on" : "beacon off";
 
         printf("  FC port %s  %s, %s (max %s), %s, %s\n",
-            text(i, "PortNumber").c_str(), colon(p.wwn).c_str(),
+            text(i, "PortNumber").c_str(), colon(wwn).c_str(),
             speedText(number(i, "Speed")).c_str(), speedText(number(i, "MaxSpeed")).c_str(),
             enabledText(number(i, "EnabledState")).c_str(), beacon.c_str());
 
-        std::string suffix = "_" + std::to_string(adapterNo) + "_" + text(i, "PortNumber");
-        for (const ch::Instance& c : connectors)
+        // A connector's Tag ends in "_<port place>".
+        std::string place = "_" + text(i, "PortNumber");
+        for (const ch::Instance* c : optics)
         {
-            std::string tag = text(c, "Tag");
-            if (adapterNo && tag.size() > suffix.size() &&
-                tag.compare(tag.size() - suffix.size(), suffix.size(), suffix) == 0)
-                printf("      optics: %s %s, %s, serial %s\n", text(c, "Manufacturer").c_str(),
-                    text(c, "PartNumber").c_str(), text(c, "Description").c_str(),
-                    text(c, "SerialNumber").c_str());
+            std::string tag = text(*c, "Tag");
+            if (tag.size() > place.size() &&
+                tag.compare(tag.size() - place.size(), place.size(), place) == 0)
+                printf("      optics: %s %s, %s, serial %s\n", text(*c, "Manufacturer").c_str(),
+                    text(*c, "PartNumber").c_str(), text(*c, "Description").c_str(),
+                    text(*c, "SerialNumber").c_str());
         }
 
-        if (p.targets.empty())
-            printf("      reaches no target\n");
-        for (const Target& t : p.targets)
+        std::vector<Target> targets;
+        for (const ch::Object_Path& initiator : initiators.of(i.path))
         {
-            size_t nd = 0, nt = 0;
-            for (const Lun& l : t.luns)
-                (l.tape ? nt : nd)++;
-            printf("      target %s: %zu disk%s, %zu tape%s\n", colon(t.remote).c_str(),
+            auto at = targetsOf.find(pathKey(initiator));
+            if (at != targetsOf.end())
+                targets.insert(targets.end(), at->second.begin(), at->second.end());
+        }
+        if (targets.empty())
+            printf("      reaches no target\n");
+        for (const Target& t : targets)
+        {
+            size_t cut = t.name.find('_');
+            std::string remote = cut == std::string::npos ? t.name : t.name.substr(cut + 1);
+            size_t nd = t.disks.size(), nt = t.tapes.size();
+            printf("      target %s: %zu disk%s, %zu tape%s\n", colon(remote).c_str(),
                 nd, nd == 1 ? "" : "s", nt, nt == 1 ? "" : "s");
-            for (const Lun& l : t.luns)
-                printUnit(l);
+            for (const ch::Instance* u : t.disks)
+                printUnit(*u, false);
+            for (const ch::Instance* u : t.tapes)
+                printUnit(*u, true);
         }
     };
 
+    auto printEthPort = [&](const ch::Instance& e, bool placed) {
+        shown.push_back(pathKey(e.path));
+        if (placed)
+            printf("  Ethernet port %s  %s, %s\n", text(e, "PortNumber").c_str(),
+                colon(text(e, "DeviceID")).c_str(), text(e, "ElementName").c_str());
+        else
+            printf("  Ethernet port %s, %s\n", colon(text(e, "DeviceID")).c_str(),
+                text(e, "ElementName").c_str());
+    };
+
+    // Adapters, in the order the host holds them.
     for (size_t n = 0; n < adapters.size(); n++)
     {
-        const Adapter& a = adapters[n];
-        const ch::Instance& c = *a.controller;
+        const ch::Instance& c = *adapters[n];
+        std::string id = lower(text(c, "DeviceID"));
+        std::vector<const ch::Instance*> card = found(elements, cards.of(c.path));
+        std::vector<const ch::Instance*> optics;
+        if (!card.empty())
+            optics = found(elements, cardConnectors.of(card[0]->path));
+
         printf("\nAdapter %zu: %s %s, serial %s, %s\n", n + 1,
             text(c, "Caption").c_str(),
-            a.package ? text(*a.package, "Model").c_str() : "",
-            text(c, "Name").c_str(), colon(a.id).c_str());
+            card.empty() ? "" : text(*card[0], "Model").c_str(),
+            text(c, "Name").c_str(), colon(id).c_str());
 
+        // Its own software: firmware and BIOS, named "<adapter>_<kind>".
         std::string versions;
-        for (const ch::Instance& sw : software)
+        for (const ch::Instance* sw : found(elements, adapterSoftware.of(c.path)))
         {
-            std::string id = lower(text(sw, "InstanceID"));
-            if (startsWith(id, a.id + "_"))
-                versions += (versions.empty() ? "" : ", ") + id.substr(a.id.size() + 1) +
-                    " " + text(sw, "VersionString");
+            std::string swId = lower(text(*sw, "InstanceID"));
+            size_t cut = swId.find('_');
+            if (isDriver(*sw) || cut == std::string::npos)
+                continue;
+            versions += (versions.empty() ? "" : ", ") + swId.substr(cut + 1) +
+                " " + text(*sw, "VersionString");
         }
         const ch::Value* st = c.get("StatusDescriptions");
         std::string status = st && !st->null && !st->elements.empty() ? st->elements[0].str : "";
         printf("  %s%s%s\n", status.c_str(), versions.empty() ? "" : "; ", versions.c_str());
 
-        for (const FCPort* p : a.fcPorts)
-            printFCPort(*p, n + 1);
-        for (const ch::Instance* e : a.ethPorts)
-            printf("  Ethernet port %s  %s, %s\n", text(*e, "PortNumber").c_str(),
-                colon(text(*e, "DeviceID")).c_str(), text(*e, "ElementName").c_str());
-        if (a.fcPorts.empty() && a.ethPorts.empty())
+        std::vector<const ch::Instance*> fc = found(elements, adapterFCPorts.of(c.path));
+        std::vector<const ch::Instance*> eth = found(elements, adapterEthPorts.of(c.path));
+        for (const ch::Instance* p : fc)
+            printFCPort(*p, optics);
+        for (const ch::Instance* e : eth)
+            printEthPort(*e, true);
+        if (fc.empty() && eth.empty())
             printf("  no ports\n");
     }
 
-    if (!unattached.empty() || !looseEth.empty())
+    // Ports that the host has and no adapter claims.
+    auto unshown = [&](const std::vector<const ch::Instance*>& ports) {
+        std::vector<const ch::Instance*> out;
+        for (const ch::Instance* p : ports)
+            if (std::find(shown.begin(), shown.end(), pathKey(p->path)) == shown.end())
+                out.push_back(p);
+        return out;
+    };
+    std::vector<const ch::Instance*> looseFC = unshown(hostPorts);
+    std::vector<const ch::Instance*> looseEth = unshown(hostEth);
+    if (!looseFC.empty() || !looseEth.empty())
         printf("\nPorts of no adapter shown above:\n");
-    for (const FCPort* p : unattached)
-        printFCPort(*p, 0);
+    for (const ch::Instance* p : looseFC)
+        printFCPort(*p, std::vector<const ch::Instance*>());
     for (const ch::Instance* e : looseEth)
-        printf("  Ethernet port %s, %s\n", colon(text(*e, "DeviceID")).c_str(),
-            text(*e, "ElementName").c_str());
+        printEthPort(*e, false);
 
     if (adapters.empty())
         printf("\nNo adapters.\n");

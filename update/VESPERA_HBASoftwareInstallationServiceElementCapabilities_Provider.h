@@ -1,13 +1,21 @@
 #ifndef _VESPERA_HBASoftwareInstallationServiceElementCapabilities_Provider_h
 #define _VESPERA_HBASoftwareInstallationServiceElementCapabilities_Provider_h
 
+#include "Provider.h"
+#include "VESPERA_HBASoftwareInstallationServiceElementCapabilities.h"
+
 namespace OLMA
 {
 
-// Serves VESPERA_HBASoftwareInstallationServiceElementCapabilities. Until its data source is wired it has no instances and
-// supports no other operation.
+// Serves VESPERA_HBASoftwareInstallationServiceElementCapabilities: the software
+// installation service with its capabilities. Enumeration only; the bridge walks the
+// associations.
 class VESPERA_HBASoftwareInstallationServiceElementCapabilities_Provider
 {
+public:
+
+    Enum_Instances_Status enum_instances(
+        const VESPERA_HBASoftwareInstallationServiceElementCapabilities* model, Enum_Instances_Handler<VESPERA_HBASoftwareInstallationServiceElementCapabilities>* handler);
 };
 
 } // namespace OLMA

@@ -148,7 +148,7 @@ private:
     pid_t _pid;
 };
 
-TEST_F(Shell, AgentPortFollowsTheProcessList)
+TEST_F(Shell, AgentPortFollowsTheProcessListWithAgentRunning)
 {
     ProviderUtil* util = ProviderUtil::getProviderUtil();
     EXPECT_EQ(0u, util->getAgentPort());

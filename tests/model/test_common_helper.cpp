@@ -188,7 +188,7 @@ TEST_F(HostTest, LongHostName)
     EXPECT_EQ(1u, log.count("WARN", "is longer than 63 characters"));
 }
 
-TEST_F(HostTest, AccessPointWhileTheAgentRuns)
+TEST_F(HostTest, AccessPointWithAgentRunning)
 {
     typedef Walk<VESPERA_RemoteServiceAccessPoint> Points;
     play("blade7", { "192.168.7.9" });

@@ -228,7 +228,7 @@ TEST_F(EthernetCim, FaultsOfAHostDescription)
         }
 }
 
-TEST_F(EthernetCim, AccessPointFollowsTheAgent)
+TEST_F(EthernetCim, AccessPointFollowsTheAgentWithAgentRunning)
 {
     std::string host = ei("VESPERA_ComputerSystem").instances.at(0)["Name"].asString();
     if (host == "localhost")

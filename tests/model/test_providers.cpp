@@ -155,7 +155,7 @@ TEST_F(Providers, EveryClassAnswersOnTheDefaultHost)
 
 // A client that lists names and then gets each one sees what the
 // enumeration shows.
-TEST_F(Providers, GetOfEveryEnumeratedPathGivesTheSameInstance)
+TEST_F(Providers, GetOfEveryEnumeratedPathGivesTheSameInstanceWithAgentRunning)
 {
     FakeAgent agent;   // so that the access point has a path to get too
 
@@ -332,7 +332,7 @@ TEST_F(Providers, SetAlarmStateOnAMezzanineCardOrAMissingPort)
 
 // The host is always exactly one; the access point is there only while the
 // console agent runs, and its absence is no error.
-TEST_F(Providers, HostAndAccessPointCounts)
+TEST_F(Providers, HostAndAccessPointCountsWithAgentRunning)
 {
     useHostFile(std::string(DTRUJ_HOSTS_DIR) + "/no-adapter.json");
     EXPECT_EQ(1u, served("VESPERA_ComputerSystem").size());
