@@ -775,6 +775,45 @@ DiagnosticRunResult* refuse(DiagnosticRunResult* result, uint32 status)
     return result;
 }
 
+// The loopback tests of a kind of port, with the mode each runs the
+// library's test in.
+struct Loopback_Mode
+{
+    diag_test_id_t id;
+    uint32 mode;
+    const char* name;
+};
+
+const Loopback_Mode FC_LOOPBACK_MODES[] =
+{
+    {DIAG_INTERNAL_LOOPBACK_TEST, MODE_INTERNAL, "internal"},
+    {DIAG_EXTERNAL_LOOPBACK_TEST, MODE_EXTERNAL, "external"},
+    {DIAG_SERDES_LOOPBACK_TEST, MODE_SERDES, "serdes"},
+};
+
+const Loopback_Mode ETH_LOOPBACK_MODES[] =
+{
+    {DIAG_EXTERNAL_ETH_LOOPBACK_TEST, MODE_EXTERNAL, "external"},
+    {DIAG_SERDES_ETH_LOOPBACK_TEST, MODE_SERDES, "serdes"},
+};
+
+// Sets the test and its mode from the test's name; false if the kind has
+// no test of that name.
+template<size_t N>
+bool pickMode(const Loopback_Mode (&modes)[N], const char* kind, const String& testName,
+    DiagnosticTestInput& input)
+{
+    for (const Loopback_Mode& m : modes)
+        if (isTest(testName, m.id))
+        {
+            input.mode = m.mode;
+            input.testId = m.id;
+            TLOG(LL_INFO, "%s test mode : %s", kind, m.name);
+            return true;
+        }
+    return false;
+}
+
 } // namespace
 
 DiagnosticRunResult* DiagnosticHelper::runLoopbackTest(String portAddress, String testName)
@@ -829,25 +868,7 @@ DiagnosticRunResult* DiagnosticHelper::runLoopbackTest(String portAddress, Strin
     input->frameCount = FC_FRAME_COUNT;
     input->dataPattern = DATA_PATTERN;
 
-    if (isTest(testName, DIAG_INTERNAL_LOOPBACK_TEST))
-    {
-        input->mode = MODE_INTERNAL;
-        input->testId = DIAG_INTERNAL_LOOPBACK_TEST;
-        TLOG(LL_INFO, "Loopback test mode : internal");
-    }
-    else if (isTest(testName, DIAG_EXTERNAL_LOOPBACK_TEST))
-    {
-        input->mode = MODE_EXTERNAL;
-        input->testId = DIAG_EXTERNAL_LOOPBACK_TEST;
-        TLOG(LL_INFO, "Loopback test mode : external");
-    }
-    else if (isTest(testName, DIAG_SERDES_LOOPBACK_TEST))
-    {
-        input->mode = MODE_SERDES;
-        input->testId = DIAG_SERDES_LOOPBACK_TEST;
-        TLOG(LL_INFO, "Loopback test mode : serdes");
-    }
-    else
+    if (!pickMode(FC_LOOPBACK_MODES, "Loopback", testName, *input))
     {
         TLOG(LL_ERR, "Unknown loopback test %s", testName.c_str());
         return refuse(result, RUN_DIAG_RETURN_UNSUPPORTED);
@@ -883,19 +904,7 @@ DiagnosticRunResult* DiagnosticHelper::runEthLoopbackTest(String portAddress, St
     input->frameCount = ETH_FRAME_COUNT;
     input->dataPattern = DATA_PATTERN;
 
-    if (isTest(testName, DIAG_EXTERNAL_ETH_LOOPBACK_TEST))
-    {
-        input->mode = MODE_EXTERNAL;
-        input->testId = DIAG_EXTERNAL_ETH_LOOPBACK_TEST;
-        TLOG(LL_INFO, "Eth Loopback test mode : external");
-    }
-    else if (isTest(testName, DIAG_SERDES_ETH_LOOPBACK_TEST))
-    {
-        input->mode = MODE_SERDES;
-        input->testId = DIAG_SERDES_ETH_LOOPBACK_TEST;
-        TLOG(LL_INFO, "Eth Loopback test mode : serdes");
-    }
-    else
+    if (!pickMode(ETH_LOOPBACK_MODES, "Eth Loopback", testName, *input))
     {
         TLOG(LL_ERR, "Unknown Ethernet loopback test %s", testName.c_str());
         return refuse(result, RUN_DIAG_RETURN_UNSUPPORTED);
