@@ -576,6 +576,13 @@ bool parse_path(const std::string& text, Object_Path& path, std::string& err,
             err = "path '" + text + "': host without namespace";
             return false;
         }
+        // An empty host would print as no host, and the path would read
+        // back with its namespace a slash shorter.
+        if (slash == 2)
+        {
+            err = "path '" + text + "': empty host";
+            return false;
+        }
         path.host = s.substr(2, slash - 2);
         pos = slash + 1;
     }
