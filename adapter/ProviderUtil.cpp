@@ -24,6 +24,7 @@
 #include "Strings.h"
 #include "Subprocess.h"
 #include "dtruj.h"
+#include "Mutex.h"
 #include "log.h"
 
 namespace OLMA
@@ -195,10 +196,16 @@ String ProviderUtil::getHostName()
 }
 
 // gethostbyname_r, growing its scratch buffer as asked: the plain
-// gethostbyname shares one static result between threads.
+// gethostbyname shares one static result between threads. One look-up at a
+// time even so: the name service modules behind it share state of their
+// own, not all of them guard it, and the locks glibc takes for the others
+// are invisible to ThreadSanitizer, which then reports their reallocations
+// as a race.
 static bool _lookUpHost(const char* name, struct hostent& entry,
     std::vector<char>& scratch)
 {
+    static Mutex lookUpLock;
+    Auto_Mutex hold(lookUpLock);
     scratch.resize(1024);
 
     for (;;)

@@ -238,8 +238,12 @@ Instance* clone(const Instance* instance)
     Instance* p = _allocate(mc->size);
 
     // The bytewise copy carries numbers and null bytes; everything that owns
-    // memory is then built anew over the copied bits.
-    memcpy((void*)p, (const void*)instance, mc->size);
+    // memory is then built anew over the copied bits. The reference count is
+    // left out: other threads may be counting on the original right now.
+    const size_t countStart = offsetof(Instance, refs);
+    const size_t countEnd = countStart + sizeof(instance->refs);
+    memcpy((void*)p, (const void*)instance, countStart);
+    memcpy((char*)p + countEnd, (const char*)instance + countEnd, mc->size - countEnd);
     p->refs = 1;
     new (&p->__name_space) String(instance->__name_space);
     ref(mc);
