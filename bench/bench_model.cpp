@@ -1,7 +1,7 @@
 // bench_model: what the module itself costs per instance of each inventory
 // class, with the adapter library's time measured and taken away.
 //
-//   bench_model [--host FILE] [--seconds S] [--scale]
+//   bench_model [--host FILE] [--seconds S] [--scale] [--class NAME]
 //
 // The module's adapter code and inventory run in this process, as in the
 // provider module, on the simulated library; the library's own time comes
@@ -149,13 +149,15 @@ Run enumerateOnce(const Class_Row& row)
     return r;
 }
 
-void classes(double minSeconds)
+void classes(double minSeconds, const std::string& only)
 {
     printf("%-34s %9s %6s %10s %10s %10s %11s %10s %9s\n", "class", "instances",
         "runs", "lib calls", "ms/enum", "lib ms", "module us/i", "gi ms", "gi calls");
 
     for (const Class_Row& row : rows)
     {
+        if (!only.empty() && only != row.name)
+            continue;
         Run sum = { 0, 0, { 0, 0 } };
         int runs = 0;
         double start = now();
@@ -213,6 +215,8 @@ void classes(double minSeconds)
     // Every logical disk by its keys, one after the other, as a client or
     // an association that walks them would.
     const Class_Row& disks = rows[sizeof(rows) / sizeof(rows[0]) - 1];
+    if (!only.empty() && only != disks.name)
+        return;
     Array<Instance*> all = enumerate(disks);
     takeLibraryTime();
     double t0 = now();
@@ -287,6 +291,7 @@ int main(int argc, char** argv)
     std::string hostFile;
     double minSeconds = 1.0;
     bool scaling = false;
+    std::string only;
 
     for (int i = 1; i < argc; i++)
     {
@@ -296,9 +301,12 @@ int main(int argc, char** argv)
             minSeconds = atof(argv[++i]);
         else if (!strcmp(argv[i], "--scale"))
             scaling = true;
+        else if (!strcmp(argv[i], "--class") && i + 1 < argc)
+            only = argv[++i];
         else
         {
-            fprintf(stderr, "usage: %s [--host FILE] [--seconds S] [--scale]\n", argv[0]);
+            fprintf(stderr, "usage: %s [--host FILE] [--seconds S] [--scale] [--class NAME]\n",
+                argv[0]);
             return 2;
         }
     }
@@ -324,7 +332,7 @@ int main(int argc, char** argv)
             return 1;
         }
         printf("host: %s\n", hostFile.c_str());
-        classes(minSeconds);
+        classes(minSeconds, only);
         if (generated)
             unlink(hostFile.c_str());
     }

@@ -139,6 +139,17 @@ const String describeStorageExtent("It is a unique identification for a Storage 
 const String describeTapeDrive("It is a unique identification for a Tape Drive");
 const String describeLogicalDisk("It is a unique identification for a Logical Disk");
 
+// An array property holding one element, built in place: a temporary array
+// assigned to it would cost two more allocations for each of the thousands
+// of units a walk makes.
+template<class T>
+void setSingle(Property<Array<T> >& p, const T& x)
+{
+    p.value.clear();
+    p.value.append(x);
+    p.null = 0;
+}
+
 // What the three classes share. The DeviceID ties a unit to its local and
 // remote port, which is how the paths of the host's view find it.
 void setCommon(CIM_LogicalDevice* p, classId_t id, const String& description,
@@ -147,31 +158,25 @@ void setCommon(CIM_LogicalDevice* p, classId_t id, const String& description,
     ProviderUtil* util = ProviderUtil::getProviderUtil();
     String unit = unitName(lun);
 
-    String deviceId(port.portWwn, "_", lun.rPortWwn);
-    deviceId += "_";
-    deviceId += trimmed(lun.vendor);
-    deviceId += "_";
-    deviceId += trimmed(lun.productId);
-    deviceId += "_";
-    deviceId += unit;
+    // Put together in one piece: the vendor and product fields are short
+    // and bounded, and the whole fits the buffer with room to spare.
+    char vendor[sizeof(lun.vendor)];
+    char product[sizeof(lun.productId)];
+    ProviderUtil::trimString(lun.vendor, vendor);
+    ProviderUtil::trimString(lun.productId, product);
+    char text[160];
+    snprintf(text, sizeof(text), "%s_%s_%s_%s_%s", port.portWwn, lun.rPortWwn, vendor,
+        product, unit.c_str());
+    String deviceId(text);
 
     p->CreationClassName.set(util->getClassName(id));
     p->SystemCreationClassName.set(util->getClassName(ID_VESPERA_ComputerSystem));
     p->SystemName.set(port.hostName);
     p->ElementName.set(unit);
     p->DeviceID.set(deviceId);
-
-    Array<String> other;
-    other.append(deviceId);
-    p->OtherIdentifyingInfo.set(other);
-
-    Array<String> descriptions;
-    descriptions.append(description);
-    p->IdentifyingDescriptions.set(descriptions);
-
-    Array<uint16> status;
-    status.append(2);
-    p->OperationalStatus.set(status);
+    setSingle(p->OtherIdentifyingInfo, deviceId);
+    setSingle(p->IdentifyingDescriptions, description);
+    setSingle(p->OperationalStatus, (uint16)2);
 }
 
 String serialName(_hbaLunInfo& lun)
