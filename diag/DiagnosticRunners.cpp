@@ -562,6 +562,44 @@ void* DiagnosticHelper::runEthLoopbackTestThread(void* input)
 // Enabling and disabling
 //------------------------------------------------------------------------------
 
+namespace
+{
+
+// One call of a setter that takes a port or an adapter out of service or
+// back. A throw is logged and counts as a failure (-1), as does a reply
+// that isn't good; forWhom, when given, is named by the last catch.
+int callSetter(const char* entry, JsonReqFP fp, const Json::Value& request,
+    const char* forWhom, Json::Value& reply)
+{
+    try
+    {
+        reply = fp(request);
+    }
+    catch (const HbaAgentError& e)
+    {
+        TLOG(LL_ERR, "%s got User exception %d: %s", entry, e.getCode(),
+            e.getMessage().c_str());
+        return -1;
+    }
+    catch (const std::exception& e)
+    {
+        TLOG(LL_ERR, "%s got std exception: %s", entry, e.what());
+        return -1;
+    }
+    catch (...)
+    {
+        if (forWhom)
+            TLOG(LL_ERR, "%s got default exception for %s", entry, forWhom);
+        else
+            TLOG(LL_ERR, "%s got default exception", entry);
+        return -1;
+    }
+
+    return ProviderUtil::isValidJsonResponse(reply) ? 0 : -1;
+}
+
+} // namespace
+
 int setPortState(String indexStr, bool enable)
 {
     Json::Value request(Json::objectValue);
@@ -573,28 +611,7 @@ int setPortState(String indexStr, bool enable)
 
     Json::Value reply;
 
-    try
-    {
-        reply = libSetPortByWwn(request);
-    }
-    catch (const HbaAgentError& e)
-    {
-        TLOG(LL_ERR, "libSetPortByWwn got User exception %d: %s", e.getCode(),
-            e.getMessage().c_str());
-        return -1;
-    }
-    catch (const std::exception& e)
-    {
-        TLOG(LL_ERR, "libSetPortByWwn got std exception: %s", e.what());
-        return -1;
-    }
-    catch (...)
-    {
-        TLOG(LL_ERR, "libSetPortByWwn got default exception");
-        return -1;
-    }
-
-    if (!ProviderUtil::isValidJsonResponse(reply))
+    if (callSetter("libSetPortByWwn", libSetPortByWwn, request, 0, reply) != 0)
         return -1;
 
     TLOG(LL_INFO, "setPortState - %s %d", indexStr.c_str(),
@@ -610,29 +627,8 @@ int setAdapterStatus(String adapterAddress, bool enable)
 
     Json::Value reply;
 
-    try
-    {
-        reply = libSetAdapterState(request);
-    }
-    catch (const HbaAgentError& e)
-    {
-        TLOG(LL_ERR, "libSetAdapterState got User exception %d: %s", e.getCode(),
-            e.getMessage().c_str());
-        return -1;
-    }
-    catch (const std::exception& e)
-    {
-        TLOG(LL_ERR, "libSetAdapterState got std exception: %s", e.what());
-        return -1;
-    }
-    catch (...)
-    {
-        TLOG(LL_ERR, "libSetAdapterState got default exception for %s",
-            adapterAddress.c_str());
-        return -1;
-    }
-
-    if (!ProviderUtil::isValidJsonResponse(reply))
+    if (callSetter("libSetAdapterState", libSetAdapterState, request, adapterAddress.c_str(),
+            reply) != 0)
         return -1;
 
     TLOG(LL_INFO, "setAdapterStatus success");
